@@ -1,0 +1,102 @@
+#include <algorithm>
+#include <cassert>
+
+#include "frame/ChildControl.h"
+#include "frame/Control.h"
+#include "frame/Site.h"
+#include "frame/host.h"
+
+namespace tessel::frame {
+
+Host::Host(const Services& services) : services_(services) {
+    assert(services.loop && services.dialogs && services.menus && services.drag && services.focus && services.clock &&
+           services.random && services.locale && services.codePage && services.pictures && services.metrics && services.colors &&
+           services.application && services.files && services.shell && services.clipboard && services.peers && services.errors);
+}
+
+Host::~Host() { retired_.clear(); }
+
+void Host::Turn() {
+    Flush();
+    const Callout callout(*this);
+    services_.loop->Turn();
+}
+
+int Host::MsgBox(const std::string& text, int style, const std::string& title) {
+    Flush();
+    const Callout callout(*this);
+    return services_.dialogs->MsgBox(text, style, title);
+}
+
+void Host::ShowOpen(const std::string& title, const std::string& filter, std::string& fileName) {
+    Flush();
+    const Callout callout(*this);
+    services_.dialogs->ShowOpen(title, filter, fileName);
+}
+
+void Host::ShowModal(Object& form) {
+    Flush();
+    const Callout callout(*this);
+    services_.dialogs->ShowModal(form);
+}
+
+void Host::Popup(Object& menu, Object* defaultEntry) {
+    Flush();
+    const Callout callout(*this);
+    services_.menus->Popup(menu, defaultEntry);
+}
+
+void Host::StartDrag(ChildControl& source) {
+    Flush();
+    const Callout callout(*this);
+    services_.drag->Start(source);
+}
+
+int Host::Execute(std::string_view verb, const std::string& target) {
+    const Callout callout(*this);
+    return services_.shell->Execute(verb, target);
+}
+
+FileOperationResult Host::Run(const FileOperation& operation) {
+    Flush();
+    const Callout callout(*this);
+    return services_.shell->Run(operation);
+}
+
+void Host::Unhandled(const ControlError& error, const std::string& where) { services_.errors->Unhandled(error, where); }
+
+void Host::Flush() {
+    if (flushing_) return;
+    flushing_ = true;
+    const Callout callout(*this);
+    while (!touched_.empty()) {
+        ChildControl* child = touched_.back();
+        touched_.pop_back();
+        child->touched_ = false;
+        if (child->peer_) child->peer_->Update();
+    }
+    flushing_ = false;
+}
+
+void Host::Touch(ChildControl& child) {
+    touched_.push_back(&child);
+    if (depth_ == 0) services_.loop->WantTurn();
+}
+
+void Host::Forget(ChildControl& child) { std::erase(touched_, &child); }
+
+void Host::Retire(std::unique_ptr<Site> site) {
+    site->Detach();
+    retired_.push_back(std::move(site));
+    if (depth_ == 0) retired_.clear();
+}
+
+void Host::LeaveOutermost() {
+    Flush();
+    while (!retired_.empty()) {
+        const auto leaving = std::move(retired_);
+        retired_.clear();
+    }
+}
+
+}  // namespace tessel::frame

@@ -1,0 +1,42 @@
+#include "frame/Picture.h"
+
+#include <algorithm>
+
+#include "frame/ClassTable.h"
+
+namespace tessel::frame {
+
+namespace {
+
+constexpr float twipsPerPixel = 15;
+
+constexpr std::array members = {
+    property<&Picture::Width>("Width", "The natural width in twips."),
+    property<&Picture::Height>("Height", "The natural height in twips."),
+};
+constexpr ClassTable table{.name = "Picture", .members = members};
+
+}  // namespace
+
+Picture::Picture(std::vector<PixelPlane> planes, std::string source) : source_(std::move(source)), planes_(std::move(planes)) {
+    std::sort(planes_.begin(), planes_.end(), [](const PixelPlane& a, const PixelPlane& b) { return a.scale < b.scale; });
+    if (planes_.empty()) return;
+    width_ = static_cast<float>(planes_.front().width / planes_.front().scale) * twipsPerPixel;
+    height_ = static_cast<float>(planes_.front().height / planes_.front().scale) * twipsPerPixel;
+}
+
+const PixelPlane* Picture::Plane(double scale) const {
+    if (planes_.empty()) return nullptr;
+    const auto found = std::find_if(planes_.begin(), planes_.end(), [&](const PixelPlane& plane) { return plane.scale >= scale; });
+    return found != planes_.end() ? &*found : &planes_.back();
+}
+
+bool Picture::EqualsObject(const Object& other) const {
+    const auto* picture = dynamic_cast<const Picture*>(&other);
+    return picture && (picture == this || (picture->width_ == width_ && picture->height_ == height_ &&
+                                           picture->source_ == source_ && picture->planes_ == planes_));
+}
+
+const ClassTable& Picture::Table() const { return table; }
+
+}  // namespace tessel::frame

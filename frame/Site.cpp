@@ -1,0 +1,56 @@
+#include "frame/Site.h"
+
+#include "frame/Control.h"
+
+namespace tessel::frame {
+
+Site::~Site() { Detach(); }
+
+void Site::SetPlace(float left, float top) {
+    if (left == left_ && top == top_) return;
+    left_ = left;
+    top_ = top;
+    Moved();
+}
+
+void Site::SetSize(float width, float height) {
+    width = width > 0 ? width : 0;
+    height = height > 0 ? height : 0;
+    if (width == width_ && height == height_) return;
+    width_ = width;
+    height_ = height;
+    Moved();
+    if (control_) control_->Resize();
+}
+
+void Site::Adopt(std::unique_ptr<frame::Control> control) {
+    control_ = std::move(control);
+    control_->site_ = this;
+    const auto size = control_->DesignSize();
+    width_ = size.width;
+    height_ = size.height;
+    control_->TakePeers();
+    control_->Initialize();
+}
+
+void Site::Start(const PropertyBag* saved, std::optional<float> width, std::optional<float> height) {
+    if (saved)
+        control_->ReadProperties(*saved);
+    else
+        control_->InitProperties();
+    const float before[] = {width_, height_};
+    SetSize(width.value_or(width_), height.value_or(height_));
+    if (before[0] == width_ && before[1] == height_) control_->Resize();
+}
+
+void Site::Show() { control_->Show(); }
+void Site::Hide() { control_->Hide(); }
+void Site::Paint() { control_->Paint(); }
+void Site::AmbientChanged(const std::string& name) { control_->AmbientChanged(name); }
+void Site::Save(PropertyBag& bag) { control_->WriteProperties(bag); }
+
+void Site::Detach() {
+    if (control_) control_->site_ = nullptr;
+}
+
+}  // namespace tessel::frame
