@@ -1,0 +1,259 @@
+#include "hosts/headless/HeadlessHost.h"
+
+#include <algorithm>
+
+#include "frame/ClassTable.h"
+#include "frame/Text.h"
+
+namespace tessel::headless {
+
+using frame::Variant;
+
+/// The host's own members of a control. The geometry is the site's; all else is what the host was given.
+class HeadlessSite::ExtenderObject final : public HostObject {
+  public:
+    ExtenderObject(HeadlessSite& site, Members members) : HostObject(site.name_, std::move(members)), site_(site) {}
+
+    Variant Get(frame::MemberKey key, frame::Arguments arguments = {}) override {
+        if (const auto* own = Own().Find(key)) return own->get(*this, arguments);
+        return HostObject::Get(key, arguments);
+    }
+    void Put(frame::MemberKey key, const Variant& value, frame::Arguments arguments = {}) override {
+        if (const auto* own = Own().Find(key))
+            own->set(*this, arguments, value);
+        else if (!key.ByNumber() && frame::EqualsNoCase(key.Name(), "ToolTipText"))
+            SetMember("ToolTipText", value);
+        else
+            HostObject::Put(key, value, arguments);
+    }
+    bool Has(frame::MemberKey key) const override {
+        return Own().Find(key) || HostObject::Has(key) || (!key.ByNumber() && frame::EqualsNoCase(key.Name(), "ToolTipText"));
+    }
+
+    std::string Name() const { return site_.name_; }
+    float Left() const { return site_.Left(); }
+    void SetLeft(float value) { site_.SetPlace(value, site_.Top()); }
+    float Top() const { return site_.Top(); }
+    void SetTop(float value) { site_.SetPlace(site_.Left(), value); }
+    float Width() const { return site_.Width(); }
+    void SetWidth(float value) { site_.SetSize(value, site_.Height()); }
+    float Height() const { return site_.Height(); }
+    void SetHeight(float value) { site_.SetSize(site_.Width(), value); }
+    bool Visible() const { return site_.visible_; }
+    void SetVisible(bool value) { site_.SetVisible(value); }
+
+  private:
+    static const frame::ClassTable& Own() {
+        using E = ExtenderObject;
+        static constexpr std::array rows = {
+            frame::property<&E::Name>("Name"),
+            frame::property<&E::Left, &E::SetLeft>("Left"),
+            frame::property<&E::Top, &E::SetTop>("Top"),
+            frame::property<&E::Width, &E::SetWidth>("Width"),
+            frame::property<&E::Height, &E::SetHeight>("Height"),
+            frame::property<&E::Visible, &E::SetVisible>("Visible"),
+        };
+        static constexpr frame::ClassTable table{.name = "Extender", .members = rows};
+        return table;
+    }
+
+    HeadlessSite& site_;
+};
+
+/// Writes each event into the log, then lets the script and the application handle it.
+class HeadlessSite::LoggingSink final : public frame::EventSink {
+  public:
+    explicit LoggingSink(HeadlessSite& site) : site_(site) {}
+    bool Wants(const frame::EventInfo&) const override { return true; }
+    void Raise(const frame::EventInfo& event, frame::EventArguments arguments) override {
+        std::vector<Variant> values;
+        values.reserve(arguments.size());
+        for (const frame::EventArgument& argument : arguments) values.push_back(argument.Get());
+        site_.headless_.log.Add({"event", site_.name_, event.name, ListOf(std::move(values))});
+        if (site_.onEvent_) site_.onEvent_(site_.name_, event, arguments);
+        if (site_.handlers_.Wants(event)) site_.handlers_.Raise(event, arguments);
+    }
+
+  private:
+    HeadlessSite& site_;
+};
+
+HeadlessSite::HeadlessSite(HeadlessHost& host, std::string name, const Placing& placing)
+    : Site(host.Frame()),
+      headless_(host),
+      form_(host.Form()),
+      name_(std::move(name)),
+      onEvent_(placing.onEvent),
+      sink_(std::make_unique<LoggingSink>(*this)) {
+    ambient_.userMode = !placing.designTime;
+    ambient_.font = placing.ambientFont ? placing.ambientFont : std::make_shared<frame::Font>();
+    ambient_.displayName = placing.displayName.empty() ? name_ : placing.displayName;
+    extender_ = std::make_unique<ExtenderObject>(*this, placing.extender);
+}
+
+HeadlessSite::~HeadlessSite() = default;
+
+void HeadlessSite::SetVisible(bool value) {
+    if (value == visible_) return;
+    visible_ = value;
+    if (visible_)
+        Show();
+    else
+        Hide();
+}
+
+frame::Object& HeadlessSite::Extender() { return *extender_; }
+frame::Object* HeadlessSite::Parent() { return &form_; }
+frame::Siblings& HeadlessSite::ParentControls() { return form_; }
+frame::EventSink& HeadlessSite::Events() { return *sink_; }
+
+void HeadlessSite::PropertyChanged(std::string_view key) { headless_.log.Add({"changed", name_, key}); }
+
+HeadlessForm::HeadlessForm(HeadlessHost& host, const std::string& name, Members members) : SurfaceObject(host.Frame(), name, {}) {
+    SetMember("Name", name);
+    SetMember("Picture", frame::ObjectRef());
+    SetMember("MouseIcon", frame::ObjectRef());
+    SetMember("MousePointer", std::int16_t{0});
+    for (auto& [key, value] : members) {
+        if (Has(key))
+            Put(key, value);
+        else
+            SetMember(key, std::move(value));
+    }
+}
+
+frame::Object& HeadlessForm::Item(int index) {
+    if (index < 0 || index >= Count()) throw frame::ControlError(frame::errors::subscript);
+    return *items_[static_cast<std::size_t>(index)];
+}
+
+void HeadlessForm::Remove(const Object& object) {
+    std::erase_if(items_, [&](const frame::Handle<Object>& item) { return item.Get() == &object; });
+}
+
+/// Writes drawing operations into the log, in the units in which the surface received them.
+class HeadlessHost::LoggingCanvas final : public frame::Canvas {
+  public:
+    LoggingCanvas(Log& log, frame::Object& owner) : log_(log), owner_(owner) {}
+
+    void Draw(const frame::DrawOp& op, const frame::Pen&, const frame::Scale&, frame::OLE_COLOR, frame::OLE_COLOR) override {
+        std::visit([this](const auto& operation) { log_.Add(EntryOf(operation)); }, op);
+    }
+
+  private:
+    static Variant Given(std::optional<float> value) { return value ? Variant(*value) : Variant(); }
+    template <class... Values>
+    Log::Entry Entry(const char* name, Values... values) const {
+        return {"draw", owner_.Path(), name, Variant(values)...};
+    }
+
+    Log::Entry EntryOf(const frame::draw::Cls&) const { return Entry("Cls"); }
+    Log::Entry EntryOf(const frame::draw::Line& op) const {
+        static constexpr const char* flags[] = {"", "B", "BF"};
+        return Entry("Line", op.x1, op.y1, op.x2, op.y2, op.color, flags[static_cast<int>(op.box)]);
+    }
+    Log::Entry EntryOf(const frame::draw::Circle& op) const {
+        return Entry("Circle", op.x, op.y, op.radius, op.color, Given(op.start), Given(op.end), Given(op.aspect));
+    }
+    Log::Entry EntryOf(const frame::draw::PSet& op) const { return Entry("PSet", op.x, op.y, op.color); }
+    Log::Entry EntryOf(const frame::draw::Print& op) const { return Entry("Print", op.text, op.x, op.y); }
+    Log::Entry EntryOf(const frame::draw::PaintPicture& op) const {
+        return Entry("PaintPicture", op.x, op.y, frame::ObjectRef(op.picture));
+    }
+    Log::Entry EntryOf(const frame::draw::DrawWidth& op) const { return Entry("DrawWidth", op.value); }
+    Log::Entry EntryOf(const frame::draw::DrawStyle& op) const { return Entry("DrawStyle", op.value); }
+    Log::Entry EntryOf(const frame::draw::DrawMode& op) const { return Entry("DrawMode", op.value); }
+
+    Log& log_;
+    frame::Object& owner_;
+};
+
+/// No child is shown; every surface is logged.
+class HeadlessHost::Canvases final : public frame::PeerFactory {
+  public:
+    explicit Canvases(Log& log) : log_(log) {}
+    std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl&) override { return nullptr; }
+    void AddCanvases(frame::DrawingSurface& surface, frame::Object& owner) override {
+        canvases_.push_back(std::make_unique<LoggingCanvas>(log_, owner));
+        surface.AddCanvas(*canvases_.back());
+    }
+
+  private:
+    Log& log_;
+    std::vector<std::unique_ptr<LoggingCanvas>> canvases_;
+};
+
+HeadlessHost::HeadlessHost() : canvases_(std::make_unique<Canvases>(log)) {
+    host_ = std::make_unique<frame::Host>(frame::Services{.loop = &loop,
+                                                          .dialogs = &dialogs,
+                                                          .menus = &menus,
+                                                          .drag = &drag,
+                                                          .focus = &focus,
+                                                          .clock = &clock,
+                                                          .random = &random,
+                                                          .locale = &locale,
+                                                          .codePage = &codePage,
+                                                          .pictures = &pictures,
+                                                          .metrics = &metrics,
+                                                          .colors = &frame::ClassicColors(),
+                                                          .application = &application,
+                                                          .files = &files,
+                                                          .shell = &shell,
+                                                          .clipboard = &clipboard,
+                                                          .peers = canvases_.get(),
+                                                          .errors = &errors});
+    NewForm("Form1");
+}
+
+HeadlessHost::~HeadlessHost() {
+    while (!sites_.empty()) Destroy(sites_.back()->Control());
+}
+
+HeadlessForm& HeadlessHost::NewForm(const std::string& name, HostObject::Members members) {
+    forms_.push_back(std::make_unique<HeadlessForm>(*this, name, std::move(members)));
+    return *forms_.back();
+}
+
+frame::Control& HeadlessHost::Create(const frame::ControlClass& controlClass, const std::string& name, const Placing& placing) {
+    auto made = std::make_unique<HeadlessSite>(*this, name, placing);
+    HeadlessSite& site = *made;
+    sites_.push_back(std::move(made));
+    try {
+        site.Adopt(controlClass.make(*host_));
+        Form().Add(site.Control());
+        site.Start(placing.saved, placing.width, placing.height);
+        if (placing.show) site.SetVisible(true);
+    } catch (const frame::ControlError&) {
+        Destroy(site.Control());
+        throw;
+    }
+    return site.Control();
+}
+
+HeadlessSite* HeadlessHost::SiteOf(const frame::Control& control) {
+    const auto found = std::find_if(sites_.begin(), sites_.end(), [&](const auto& site) { return &site->Control() == &control; });
+    return found != sites_.end() ? found->get() : nullptr;
+}
+
+HeadlessSite* HeadlessHost::FindSite(std::string_view name) {
+    const auto found =
+        std::find_if(sites_.begin(), sites_.end(), [&](const auto& site) { return frame::EqualsNoCase(site->Name(), name); });
+    return found != sites_.end() ? found->get() : nullptr;
+}
+
+void HeadlessHost::Destroy(frame::Control& control) {
+    const auto found = std::find_if(sites_.begin(), sites_.end(), [&](const auto& site) { return &site->Control() == &control; });
+    if (found == sites_.end()) return;
+    for (const auto& form : forms_) form->Remove(control);
+    auto site = std::move(*found);
+    sites_.erase(found);
+    host_->Retire(std::move(site));
+}
+
+frame::MemoryBag HeadlessHost::Save(frame::Control& control) {
+    frame::MemoryBag bag;
+    control.WriteProperties(bag);
+    return bag;
+}
+
+}  // namespace tessel::headless

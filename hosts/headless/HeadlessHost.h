@@ -1,0 +1,159 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "frame/Control.h"
+#include "hosts/headless/HostObject.h"
+#include "hosts/headless/Log.h"
+#include "hosts/headless/Services.h"
+#include "hosts/headless/VirtualClock.h"
+
+namespace tessel::headless {
+
+class HeadlessForm;
+class HeadlessHost;
+
+/// How a control is placed.
+struct Placing {
+    bool designTime = false;
+    const frame::PropertyBag* saved = nullptr;     ///< loaded from it; placed new without
+    std::optional<float> width = {}, height = {};  ///< in twips; the control's own size where there is none
+    HostObject::Members extender = {};             ///< members that the host adds: `ToolTipText` and others
+    frame::FontRef ambientFont = {};
+    std::string displayName = {};  ///< the name where there is none
+    bool show = true;
+    /// Called for each event, with the control's name, before the application's handlers: a script's.
+    std::function<void(const std::string&, const frame::EventInfo&, frame::EventArguments)> onEvent = {};
+};
+
+/// The place of a control on the headless host. Its extender has `Name`, `Left`, `Top`, `Width`, `Height`, `Visible`, and what
+/// it was given. `ToolTipText` exists once it has been given or set.
+class HeadlessSite final : public frame::Site {
+  public:
+    HeadlessSite(HeadlessHost& host, std::string name, const Placing& placing);
+    ~HeadlessSite() override;
+
+    const std::string& Name() const { return name_; }
+    /// The application's handlers.
+    frame::Handlers& ApplicationHandlers() { return handlers_; }
+    bool Visible() const { return visible_; }
+    /// Makes the control visible or not; a change calls `Show` or `Hide`.
+    void SetVisible(bool value);
+    void SetUserMode(bool value) { ambient_.userMode = value; }
+    void SetAmbientFont(frame::FontRef font) { ambient_.font = std::move(font); }
+    void SetDisplayName(std::string name) { ambient_.displayName = std::move(name); }
+
+    const frame::AmbientProperties& Ambient() const override { return ambient_; }
+    frame::Object& Extender() override;
+    frame::Object* Parent() override;
+    frame::Siblings& ParentControls() override;
+    void PropertyChanged(std::string_view key) override;
+    frame::EventSink& Events() override;
+    std::string Path() const override { return name_; }
+
+  private:
+    class ExtenderObject;
+    class LoggingSink;
+
+    struct AmbientState final : frame::AmbientProperties {
+        bool UserMode() const override { return userMode; }
+        frame::FontRef Font() const override { return font->Copy(); }
+        std::string DisplayName() const override { return displayName; }
+
+        bool userMode = true;
+        frame::FontRef font;
+        std::string displayName;
+    };
+
+    HeadlessHost& headless_;
+    HeadlessForm& form_;
+    std::string name_;
+    decltype(Placing::onEvent) onEvent_;
+    AmbientState ambient_;
+    frame::Handlers handlers_;
+    std::unique_ptr<LoggingSink> sink_;
+    std::unique_ptr<ExtenderObject> extender_;
+    bool visible_ = false;
+};
+
+/// A form with what stands on it: controls and the host's own objects, in the order in which they came.
+class HeadlessForm final : public SurfaceObject, public frame::Siblings {
+  public:
+    HeadlessForm(HeadlessHost& host, const std::string& name, Members members);
+
+    int Count() const override { return static_cast<int>(items_.size()); }
+    Object& Item(int index) override;
+    void Add(Object& object) { items_.emplace_back(object); }
+    void Remove(const Object& object);
+
+  private:
+    std::vector<frame::Handle<Object>> items_;
+};
+
+/// A host without a screen: a virtual clock, boxes that answer by themselves, a shell that carries nothing out, and a log of
+/// all that happened. Everything works the same on every machine.
+class HeadlessHost {
+  public:
+    HeadlessHost();
+    ~HeadlessHost();
+
+    frame::Host& Frame() { return *host_; }
+    operator frame::Host&() { return *host_; }
+
+    /// The form that holds what is created next; "Form1" at first.
+    HeadlessForm& Form() { return *forms_.back(); }
+    HeadlessForm& NewForm(const std::string& name, HostObject::Members members = {});
+
+    /// Makes, loads and shows a control. An error of its load passes to the caller, and the control is gone.
+    frame::Control& Create(const frame::ControlClass& controlClass, const std::string& name, const Placing& placing = {});
+    template <class C>
+    C& Create(const std::string& name, const Placing& placing = {}) {
+        return static_cast<C&>(Create(frame::ControlClass{nullptr, &Make<C>}, name, placing));
+    }
+    /// The site of a control that was created here and not yet destroyed; null otherwise.
+    HeadlessSite* SiteOf(const frame::Control& control);
+    HeadlessSite* FindSite(std::string_view name);
+    void Destroy(frame::Control& control);
+
+    /// What a control writes when its design is saved.
+    frame::MemoryBag Save(frame::Control& control);
+
+    Log log;
+    VirtualClock clock;
+    ScriptedLoop loop{log};
+    ScriptedDialogs dialogs{log};
+    ScriptedMenus menus{log};
+    ScriptedDrag drag{log};
+    ScriptedFocus focus{log};
+    ScriptedShell shell{log};
+    ScriptedRandom random;
+    FixedLocale locale;
+    Windows1252 codePage;
+    FixedMetrics metrics;
+    NoPictures pictures;
+    FixedApplication application;
+    MemoryClipboard clipboard;
+    NoDisk files;
+    ErrorList errors;
+
+  private:
+    friend class HeadlessSite;
+    class LoggingCanvas;
+    class Canvases;
+
+    template <class C>
+    static std::unique_ptr<frame::Control> Make(frame::Host& host) {
+        return std::make_unique<C>(host);
+    }
+
+    std::unique_ptr<Canvases> canvases_;
+    std::unique_ptr<frame::Host> host_;
+    std::vector<std::unique_ptr<HeadlessForm>> forms_;
+    std::vector<std::unique_ptr<HeadlessSite>> sites_;
+};
+
+}  // namespace tessel::headless

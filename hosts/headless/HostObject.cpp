@@ -1,0 +1,100 @@
+#include "hosts/headless/HostObject.h"
+
+#include <algorithm>
+
+#include "frame/ClassTable.h"
+#include "frame/Error.h"
+#include "frame/Text.h"
+
+namespace tessel::headless {
+
+using frame::ControlError;
+using frame::Variant;
+
+namespace {
+
+constexpr frame::ClassTable plainTable{.name = "HostObject", .members = {}};
+constexpr frame::ClassTable drawingTable{.name = "Surface", .members = frame::drawingMembers};
+
+}  // namespace
+
+const frame::ClassTable& HostObject::Table() const { return plainTable; }
+
+const Variant* HostObject::Find(frame::MemberKey key) const {
+    if (key.ByNumber()) return nullptr;
+    const auto found = std::find_if(members_.begin(), members_.end(),
+                                    [&](const auto& member) { return frame::EqualsNoCase(member.first, key.Name()); });
+    return found != members_.end() ? &found->second : nullptr;
+}
+
+Variant HostObject::Get(frame::MemberKey key, frame::Arguments arguments) {
+    const Variant* value = Find(key);
+    if (!value) throw ControlError(frame::errors::noSuchMember);
+    if (!arguments.empty()) throw ControlError(frame::errors::wrongArguments);
+    return *value;
+}
+
+void HostObject::Put(frame::MemberKey key, const Variant& value, frame::Arguments arguments) {
+    if (!Find(key)) throw ControlError(frame::errors::noSuchMember);
+    if (!arguments.empty()) throw ControlError(frame::errors::wrongArguments);
+    SetMember(key.Name(), value);
+}
+
+Variant HostObject::Call(frame::MemberKey key, frame::Arguments arguments) { return Get(key, arguments); }
+
+frame::ObjectRef HostObject::Inner(std::string_view name) {
+    const Variant* value = Find(name);
+    return value && value->Type() == frame::VarType::Object ? value->ToObject() : frame::ObjectRef();
+}
+
+void HostObject::SetMember(std::string_view name, Variant value) {
+    const auto found =
+        std::find_if(members_.begin(), members_.end(), [&](const auto& member) { return frame::EqualsNoCase(member.first, name); });
+    if (found != members_.end())
+        found->second = std::move(value);
+    else
+        members_.emplace_back(name, std::move(value));
+}
+
+SurfaceObject::SurfaceObject(frame::Host& host, std::string path, Members members)
+    : HostObject(std::move(path), {}), DrawingSurface(host) {
+    host.Peers().AddCanvases(*this, *this);
+    for (auto& [name, value] : members) {
+        if (drawingTable.Find(std::string_view(name)))
+            Put(name, value);
+        else
+            SetMember(name, std::move(value));
+    }
+}
+
+Variant SurfaceObject::Get(frame::MemberKey key, frame::Arguments arguments) {
+    const frame::Member* drawing = drawingTable.Find(key);
+    return drawing && drawing->get ? drawing->get(*this, arguments) : HostObject::Get(key, arguments);
+}
+
+void SurfaceObject::Put(frame::MemberKey key, const Variant& value, frame::Arguments arguments) {
+    const frame::Member* drawing = drawingTable.Find(key);
+    if (drawing && drawing->set)
+        drawing->set(*this, arguments, value);
+    else
+        HostObject::Put(key, value, arguments);
+}
+
+Variant SurfaceObject::Call(frame::MemberKey key, frame::Arguments arguments) {
+    const frame::Member* drawing = drawingTable.Find(key);
+    return drawing && drawing->call ? drawing->call(*this, arguments) : Get(key, arguments);
+}
+
+bool SurfaceObject::Has(frame::MemberKey key) const { return drawingTable.Find(key) || HostObject::Has(key); }
+
+void SurfaceObject::SetScaleWidth(float value) {
+    const float present = ScaleWidth();
+    inner_.width = value * (present != 0 ? inner_.width / present : 1);
+}
+
+void SurfaceObject::SetScaleHeight(float value) {
+    const float present = ScaleHeight();
+    inner_.height = value * (present != 0 ? inner_.height / present : 1);
+}
+
+}  // namespace tessel::headless

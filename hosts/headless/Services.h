@@ -1,0 +1,186 @@
+#pragma once
+
+#include <cstdint>
+#include <deque>
+#include <map>
+#include <optional>
+#include <random>
+#include <string>
+
+#include "frame/host.h"
+#include "hosts/headless/Log.h"
+
+/// The small services of the headless host. Each writes what it was asked into the log.
+namespace tessel::headless {
+
+class ScriptedLoop final : public frame::MessageLoop {
+  public:
+    explicit ScriptedLoop(Log& log) : log_(log) {}
+    void Turn() override { log_.Add({"yield"}); }
+
+  private:
+    Log& log_;
+};
+
+/// Boxes that answer by themselves, from queues. With an empty queue a message box answers its default button (OK; Yes of Yes
+/// and No), a file dialog is cancelled, a form is cancelled.
+class ScriptedDialogs final : public frame::Dialogs {
+  public:
+    explicit ScriptedDialogs(Log& log) : log_(log) {}
+    int MsgBox(const std::string& text, int style, const std::string& title) override;
+    void ShowOpen(const std::string& title, const std::string& filter, std::string& fileName) override;
+    void ShowModal(frame::Object& form) override;
+
+    std::deque<int> answers;
+    std::deque<std::optional<std::string>> fileNames;  ///< nothing for a cancelled dialog
+    std::deque<std::function<void()>> forms;           ///< what the user does while a form is open
+
+  private:
+    Log& log_;
+};
+
+/// Menus whose entries are picked from a queue, by their paths.
+class ScriptedMenus final : public frame::Menus {
+  public:
+    explicit ScriptedMenus(Log& log) : log_(log) {}
+    void Popup(frame::Object& menu, frame::Object* defaultEntry) override;
+
+    std::deque<std::function<void()>> picks;
+
+  private:
+    Log& log_;
+};
+
+class ScriptedDrag final : public frame::DragAndDrop {
+  public:
+    explicit ScriptedDrag(Log& log) : log_(log) {}
+    void Start(frame::ChildControl& source) override;
+
+  private:
+    Log& log_;
+};
+
+class ScriptedFocus final : public frame::Focus {
+  public:
+    explicit ScriptedFocus(Log& log) : log_(log) {}
+    void Set(frame::ChildControl& child) override;
+
+  private:
+    Log& log_;
+};
+
+/// A shell that carries nothing out. Results come from queues; with an empty queue every request succeeds.
+class ScriptedShell final : public frame::Shell {
+  public:
+    explicit ScriptedShell(Log& log) : log_(log) {}
+    int Execute(std::string_view verb, const std::string& target) override;
+    frame::FileOperationResult Run(const frame::FileOperation& operation) override;
+
+    std::deque<int> executeResults;
+    std::deque<frame::FileOperationResult> operationResults;
+
+  private:
+    Log& log_;
+};
+
+/// Random numbers from a queue, and behind it from a generator that repeats for the same seed.
+class ScriptedRandom final : public frame::Random {
+  public:
+    float Next() override;
+    void Restart(double seed) override;
+    void RestartFromClock() override { Restart(0); }
+
+    std::deque<float> queue;
+
+  private:
+    std::mt19937 generator_;
+};
+
+/// A fixed locale: "1,234.5", "2/3/2001 4:05:06 AM", "Saturday, February 3, 2001"; local time is Coordinated Universal Time.
+class FixedLocale final : public frame::Locale {
+  public:
+    std::string DateText(frame::Date date) override;
+    std::string LongDateText(frame::Date date) override;
+    std::string Grouped(std::int64_t number) override;
+    frame::Date LocalTime(std::int64_t seconds) override;
+};
+
+/// The code page Windows-1252.
+class Windows1252 final : public frame::CodePage {
+  public:
+    std::optional<std::string> ToNarrow(std::string_view text) override;
+    std::string FromNarrow(std::string_view bytes) override;
+};
+
+/// Every character is 6 pixels wide and every line 13 pixels high, in every font.
+class FixedMetrics final : public frame::TextMetrics {
+  public:
+    frame::TextSize Measure(const frame::Font& font, std::string_view text, std::optional<float> wrapWidth) override;
+};
+
+class NoPictures final : public frame::PictureLoader {
+  public:
+    frame::PictureRef LoadPicture(const std::string& fileName) override;
+    frame::PictureRef FileIcon(const std::string& path, int flags) override;
+};
+
+class FixedApplication final : public frame::Application {
+  public:
+    std::string Path() override { return path; }
+    int ScreenMousePointer() override { return pointer; }
+    void SetScreenMousePointer(int value) override { pointer = value; }
+
+    std::string path = "C:\\App";
+    int pointer = 0;
+};
+
+class MemoryClipboard final : public frame::Clipboard {
+  public:
+    void Clear() override;
+    bool Has(int format) override { return contents.contains(format); }
+    bool Put(int format, std::string bytes) override;
+    std::optional<std::string> Read(int format) override;
+
+    std::map<int, std::string> contents;
+    bool held = false;  ///< another program holds it
+};
+
+/// A file system without any drive: nothing exists on it and nothing can be written.
+class NoDisk final : public frame::FileSystem {
+  public:
+    char Separator() const override { return '\\'; }
+    bool IgnoresCase() const override { return true; }
+    bool FileExists(std::string_view) override { return false; }
+    bool FolderExists(std::string_view) override { return false; }
+    bool DriveExists(std::string_view) override { return false; }
+    frame::Status Stat(std::string_view, frame::FileRecord&) override { return frame::errors::fileNotFound; }
+    frame::Status List(std::string_view, const std::function<bool(const frame::FileRecord&)>&) override {
+        return frame::errors::pathNotFound;
+    }
+    std::vector<frame::DriveRecord> Drives() override { return {}; }
+    std::string TypeText(std::int32_t) override { return {}; }
+    frame::Status CreateFolder(std::string_view) override { return frame::errors::pathNotFound; }
+    frame::Status Rename(std::string_view, std::string_view) override { return frame::errors::fileNotFound; }
+    frame::Status Delete(std::string_view) override { return frame::errors::fileNotFound; }
+    frame::Status SetAttributes(std::string_view, std::int32_t) override { return frame::errors::fileNotFound; }
+    std::string TemporaryFolder() override { return {}; }
+    std::string SpecialFolder(int) override { return {}; }
+    frame::Status OpenForReading(std::string_view, std::unique_ptr<frame::BinaryFile>&) override {
+        return frame::errors::fileNotFound;
+    }
+    frame::Status WriteOver(std::string_view, std::string_view) override { return frame::errors::pathNotFound; }
+};
+
+/// Where unhandled errors gather.
+class ErrorList final : public frame::ErrorSink {
+  public:
+    struct Report {
+        frame::ControlError error;
+        std::string where;
+    };
+    void Unhandled(const frame::ControlError& error, const std::string& where) override { reports.push_back({error, where}); }
+
+    std::vector<Report> reports;
+};
+
+}  // namespace tessel::headless
