@@ -1,0 +1,90 @@
+#pragma once
+
+#include <functional>
+#include <map>
+#include <memory>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "hosts/headless/HeadlessHost.h"
+#include "tools/tessel-host/Json.h"
+
+namespace tessel::tools {
+
+/// A scripted session with one headless host: requests in, replies out. Nothing that it is given ends the program: what
+/// cannot be understood or done gets an error reply.
+class Session {
+  public:
+    Session();
+    ~Session();
+
+    /// Carries out one line and gives the reply as one line, without its end.
+    std::string Answer(std::string_view line);
+    /// The reply to a line that was too long to be read.
+    std::string AnswerTooLong();
+
+  private:
+    using Request = Json;
+    struct Handler;
+    class ApplicationObject;
+    class ScreenObject;
+
+    std::string Reply(Json reply);
+    /// Carries out a request: its value, or its error.
+    Json Carry(const Request& request);
+    Json Value(const Request& request);
+
+    // The requests.
+    Json Form(const Request& request);
+    Json Sibling(const Request& request);
+    Json Create(const Request& request);
+    Json Show(const Request& request);
+    Json Hide(const Request& request);
+    Json Paint(const Request& request);
+    Json Save(const Request& request);
+    Json Destroy(const Request& request);
+    Json Resize(const Request& request);
+    Json Ambient(const Request& request);
+    Json Get(const Request& request);
+    Json Put(const Request& request);
+    Json Call(const Request& request);
+    Json Fire(const Request& request);
+    Json Handle(const Request& request);
+    Json Advance(const Request& request);
+    Json Random(const Request& request);
+    Json Now(const Request& request);
+    Json Answers(const Request& request);
+    Json Shell(const Request& request);
+
+    // Objects.
+    frame::ObjectRef Root(std::string_view name);
+    frame::ObjectRef Find(const std::string& path);
+    frame::Object& Target(const Request& request);
+    headless::HeadlessSite& SiteOf(const Request& request);
+    /// The object that has the member: the control itself, or the host's own members for it.
+    frame::Object& Holder(frame::Object& object, frame::MemberKey key);
+
+    // Values.
+    frame::Variant From(const Json& json);
+    std::vector<frame::Variant> Arguments(const Request& request);
+    headless::HostObject::Members MembersFrom(const Json& json);
+    frame::MemoryBag BagFrom(const Json& json);
+
+    // Events and the log.
+    void OnEvent(const std::string& object, const frame::EventInfo& event, frame::EventArguments arguments);
+    void RunAll(const Json& requests);
+    void GatherLog();
+
+    headless::HeadlessHost host_;
+    std::vector<std::unique_ptr<headless::HostObject>> siblings_;
+    std::vector<std::unique_ptr<frame::Object>> modules_;
+    std::map<std::string, std::shared_ptr<Handler>> handlers_;  // by object and event, in lower case
+    ObjectFinder finder_;
+    frame::ObjectRef held_;  // the object that the latest request names
+    Json log_ = Json::array();
+    int depth_ = 0;  // requests that are running one inside the other
+};
+
+}  // namespace tessel::tools
