@@ -52,7 +52,7 @@ Object& Control::Extender() const {
 
 void Control::TakePeers() {
     for (ChildControl* child : children_) child->AttachPeer(host_.Peers().MakePeer(*child));
-    host_.Peers().AddCanvases(surface_, *this);
+    surface_.AddCanvas(host_.Peers().MakeCanvas(surface_, *this));
 }
 
 Variant BagDefault::For(const Control& control) const {

@@ -156,6 +156,7 @@ void DrawingSurface::SetScaleHeight(float value) {
 void DrawingSurface::SetBackColor(OLE_COLOR value) {
     if (value == backColor_) return;
     backColor_ = value;
+    Wiped();
     LookChanged();
 }
 
@@ -168,6 +169,12 @@ void DrawingSurface::SetForeColor(OLE_COLOR value) {
 void DrawingSurface::SetFont(const FontRef& value) {
     font_.Set(value);
     LookChanged();
+}
+
+void DrawingSurface::AddCanvas(std::unique_ptr<Canvas> canvas) {
+    if (!canvas) return;
+    canvases_.push_back(canvas.get());
+    ownCanvases_.push_back(std::move(canvas));
 }
 
 Scale DrawingSurface::PixelScale() const {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <memory>
 #include <optional>
 #include <string>
 #include <vector>
@@ -92,12 +93,16 @@ class DrawingSurface {
     /// A canvas that gets every operation from now on. It must outlive the surface, or be removed.
     void AddCanvas(Canvas& canvas) { canvases_.push_back(&canvas); }
     void RemoveCanvas(Canvas& canvas) { std::erase(canvases_, &canvas); }
+    /// The same for a canvas that lives as long as the surface; null is none.
+    void AddCanvas(std::unique_ptr<Canvas> canvas);
 
   protected:
     /// The inner size in twips.
     virtual TextSize InnerSize() const = 0;
     /// RGB of a pixel, where the surface keeps pixels.
     virtual std::optional<OLE_COLOR> PixelOf(int /*x*/, int /*y*/) const { return std::nullopt; }
+    /// A new background has wiped what was drawn.
+    virtual void Wiped() {}
     /// Something of the surface's look has changed.
     virtual void LookChanged() {}
     /// How this surface's units become pixels at scale 1.
@@ -111,6 +116,7 @@ class DrawingSurface {
 
     Host& host_;
     std::vector<Canvas*> canvases_;
+    std::vector<std::unique_ptr<Canvas>> ownCanvases_;
     Pen pen_;
     ScaleModeConstants scaleMode_ = ScaleModeConstants::Twips;
     float scaleLeft_ = 0, scaleTop_ = 0, userWidth_ = 0, userHeight_ = 0;

@@ -23,6 +23,7 @@
 /// gives each control a `Site` (see Site.h).
 namespace tessel::frame {
 
+class Canvas;
 class ChildControl;
 class Control;
 class DrawingSurface;
@@ -204,8 +205,8 @@ class PeerFactory {
     virtual ~PeerFactory() = default;
     /// Null where the host shows nothing: the child works all the same.
     virtual std::unique_ptr<Peer> MakePeer(ChildControl& child) = 0;
-    /// Called for each surface that can be drawn on, before its first operation: the host adds its canvases.
-    virtual void AddCanvases(DrawingSurface& surface, Object& owner) = 0;
+    /// What shows or records the drawing of a surface, made before its first operation and owned by it; null for none.
+    virtual std::unique_ptr<Canvas> MakeCanvas(DrawingSurface& surface, Object& owner) = 0;
 };
 
 /// Where errors go that no direct caller can take.

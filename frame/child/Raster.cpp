@@ -4,6 +4,8 @@
 #include <cmath>
 #include <utility>
 
+#include "frame/Picture.h"
+
 namespace tessel::child {
 
 using frame::OLE_COLOR;
@@ -48,7 +50,7 @@ Range Visible(int begin, int end, int sourceLimit, std::int64_t offset, int limi
 
 }  // namespace
 
-Raster::Raster(int width, int height, OLE_COLOR background, PlaneOf planes) : planeOf(planes) { Resize(width, height, background); }
+Raster::Raster(int width, int height, OLE_COLOR background) { Resize(width, height, background); }
 
 void Raster::Resize(int width, int height, OLE_COLOR background) {
     width = std::clamp(width, 0, maximumSide);
@@ -151,10 +153,18 @@ void Raster::DrawDot(const draw::PSet& dot, const Pen& pen, const Scale& scale) 
 }
 
 void Raster::DrawPicture(const draw::PaintPicture& picture, const Scale& scale) {
-    const Raster* plane = planeOf && picture.picture ? planeOf(*picture.picture) : nullptr;
+    const frame::PixelPlane* plane = picture.picture ? picture.picture->Plane(1) : nullptr;
     if (!plane) return;
+    constexpr std::uint32_t halfOpaque = 0x80000000u, rgb = 0xFFFFFF;
     const raster::Point at = PointAt(scale, picture.x, picture.y);
-    Blit(at.x, at.y, *plane, plane->Whole());
+    const Range across = Visible(0, plane->width, plane->width, at.x, columns);
+    const Range along = Visible(0, plane->height, plane->height, at.y, rows);
+    for (std::int64_t row = along.begin; row < along.end; ++row) {
+        for (std::int64_t column = across.begin; column < across.end; ++column) {
+            const std::uint32_t pixel = plane->pixels[static_cast<std::size_t>(row * plane->width + column)];
+            if (pixel & halfOpaque) pixels[IndexOf(static_cast<int>(column + at.x), static_cast<int>(row + at.y))] = pixel & rgb;
+        }
+    }
 }
 
 void Raster::Stroke(raster::Runs runs, int penWidth, Ink ink) {

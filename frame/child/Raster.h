@@ -10,11 +10,6 @@
 
 namespace tessel::child {
 
-class Raster;
-
-/// The pixels of a picture, or null for a picture that has none. What it points to lives at least as long as the picture.
-using PlaneOf = const Raster* (*)(const frame::Picture&);
-
 /// A plane of RGB pixels that keeps what is drawn on it: the surface of a picture box that no screen shows.
 ///
 /// How it draws. An operation touches each pixel at most once, so that XOR and invert drawn twice leave the plane as it was.
@@ -24,7 +19,8 @@ using PlaneOf = const Raster* (*)(const frame::Picture&);
 /// - `Circle`: the radius is in the scale's horizontal units, rounded to whole pixels; a negative radius, or none that is a
 ///   number, draws nothing. An aspect that is negative or no number counts as 1. An arc shows at least one pixel.
 /// - `PSet`: one pixel, with a wide pen a round dot, whatever the style.
-/// - `Cls` fills with the background and `PaintPicture` copies, whatever the mode.
+/// - `Cls` fills with the background and `PaintPicture` copies, whatever the mode. Of a picture the plane of scale 1 is taken;
+///   its pixels are drawn where they are at least half opaque.
 /// - `Print` draws nothing: the raster has no font.
 /// - The pen's width is held within 1 and 32,767 pixels. Broken styles count for width 1, wider pens draw them solid. The
 ///   transparent style leaves out the outline: of a filled box remains what an outline of width 1 encloses.
@@ -35,8 +31,8 @@ class Raster final : public frame::Canvas {
     static constexpr int maximumPixels = 64 * 1024 * 1024;
 
     /// A plane filled with `background`. Sizes below 0 count as 0, and above `maximumSide` as that; a height that would give more
-    /// than `maximumPixels` is made smaller. Without `planeOf`, pictures are not drawn.
-    Raster(int width, int height, frame::OLE_COLOR background, PlaneOf planeOf = nullptr);
+    /// than `maximumPixels` is made smaller.
+    Raster(int width, int height, frame::OLE_COLOR background);
 
     /// The size is held as in the constructor. Pixels that are in both sizes stay, new ones are `background`.
     void Resize(int width, int height, frame::OLE_COLOR background);
@@ -76,7 +72,6 @@ class Raster final : public frame::Canvas {
 
     int columns = 0, rows = 0;
     std::vector<std::uint32_t> pixels;
-    PlaneOf planeOf;
 };
 
 }  // namespace tessel::child

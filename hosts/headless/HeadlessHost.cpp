@@ -173,14 +173,12 @@ class HeadlessHost::Canvases final : public frame::PeerFactory {
   public:
     explicit Canvases(Log& log) : log_(log) {}
     std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl&) override { return nullptr; }
-    void AddCanvases(frame::DrawingSurface& surface, frame::Object& owner) override {
-        canvases_.push_back(std::make_unique<LoggingCanvas>(log_, owner));
-        surface.AddCanvas(*canvases_.back());
+    std::unique_ptr<frame::Canvas> MakeCanvas(frame::DrawingSurface&, frame::Object& owner) override {
+        return std::make_unique<LoggingCanvas>(log_, owner);
     }
 
   private:
     Log& log_;
-    std::vector<std::unique_ptr<LoggingCanvas>> canvases_;
 };
 
 HeadlessHost::HeadlessHost() : canvases_(std::make_unique<Canvases>(log)) {

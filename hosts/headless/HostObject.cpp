@@ -58,7 +58,7 @@ void HostObject::SetMember(std::string_view name, Variant value) {
 
 SurfaceObject::SurfaceObject(frame::Host& host, std::string path, Members members)
     : HostObject(std::move(path), {}), DrawingSurface(host) {
-    host.Peers().AddCanvases(*this, *this);
+    AddCanvas(host.Peers().MakeCanvas(*this, *this));
     for (auto& [name, value] : members) {
         if (drawingTable.Find(std::string_view(name)))
             Put(name, value);

@@ -16,6 +16,8 @@
 #include <utility>
 #include <vector>
 
+#include "frame/Picture.h"
+
 namespace tessel::child {
 namespace {
 
@@ -753,31 +755,21 @@ TEST(RasterBlit, WithinOnePlaneReadsBeforeItWrites) {
     EXPECT_EQ(Rows(raster), "###...\n");
 }
 
-/// A picture is only an identity here; its pixels are looked up by it.
-const Raster* picturePixels = nullptr;
-const Raster* PixelsOf(const frame::Picture&) { return picturePixels; }
-
-TEST(RasterPicture, IsCopiedToTheScaledPosition) {
-    const Raster pixels(2, 2, ink);
-    const auto identity = std::make_shared<int>(0);
-    const std::shared_ptr<frame::Picture> picture(identity, reinterpret_cast<frame::Picture*>(identity.get()));
-    const DrawOp op = draw::PaintPicture{30, -10, picture};
+TEST(RasterPicture, IsCopiedToTheScaledPositionWhereItIsOpaque) {
+    constexpr std::uint32_t opaque = 0xFF000000u, clear = 0x00FFFFFFu;
+    const std::vector<frame::PixelPlane> planes = {{2, 6, 2, std::vector<std::uint32_t>(12, opaque | 0x123456)},
+                                                   {1, 3, 1, {opaque | ink, clear, opaque | ink}}};
+    const auto picture = std::make_shared<frame::Picture>(planes, "");
     const Scale scale{0, 0, 0.1f, 0.1f};
 
-    Raster without(5, 2, paper);
-    without.Draw(op, {}, scale, paper, 0);
-    EXPECT_EQ(Rows(without), ".....\n.....\n");
-
-    Raster raster(5, 2, paper, PixelsOf);
-    picturePixels = nullptr;
-    raster.Draw(op, {}, scale, paper, 0);
+    Raster raster(5, 2, paper);
+    raster.Draw(draw::PaintPicture{10, 0, nullptr}, {}, scale, paper, 0);
     EXPECT_EQ(Rows(raster), ".....\n.....\n");
-    picturePixels = &pixels;
-    raster.Draw(draw::PaintPicture{30, -10, nullptr}, {}, scale, paper, 0);
-    EXPECT_EQ(Rows(raster), ".....\n.....\n");
-    raster.Draw(op, {1, draw::transparent, draw::xorPen}, scale, paper, 0);
-    EXPECT_EQ(Rows(raster), "...##\n.....\n");
-    picturePixels = nullptr;
+    raster.Draw(draw::PaintPicture{10, 10, picture}, {1, draw::transparent, draw::xorPen}, scale, paper, 0);
+    EXPECT_EQ(Rows(raster), ".....\n.#.#.\n");
+    raster.Draw(draw::PaintPicture{30, -10, picture}, {}, scale, paper, 0);
+    raster.Draw(draw::PaintPicture{-20, 0, picture}, {}, scale, paper, 0);
+    EXPECT_EQ(Rows(raster), "#....\n.#.#.\n");
 }
 
 }  // namespace

@@ -1,0 +1,63 @@
+#pragma once
+
+#include "frame/ChildControl.h"
+#include "frame/Surface.h"
+#include "frame/child/Raster.h"
+
+namespace tessel::child {
+
+/// A box that is drawn on and that keeps what was drawn: its pixels at scale 1 can be read back with `Point`, and `Image` gives
+/// them as a picture. Its size is in its owner's twips, its inside in its own scale.
+class PictureBox final : public frame::ChildControl, public frame::DrawingSurface {
+  public:
+    PictureBox(frame::Control& owner, std::string name);
+
+    /// The picture behind what is drawn. A new one, or none, clears the drawing; with `AutoSize` the box takes its size.
+    const frame::PictureRef& Picture() const { return picture_; }
+    void SetPicture(const frame::PictureRef& value);
+    /// What the box shows, as a picture of its own.
+    frame::PictureRef Image() const;
+    bool AutoSize() const { return autoSize_; }
+    void SetAutoSize(bool value);
+    /// 0 none, any other number a border of two pixels on each side.
+    std::int16_t BorderStyle() const { return borderStyle_; }
+    void SetBorderStyle(std::int16_t value);
+    std::int16_t MousePointer() const { return mousePointer_; }
+    void SetMousePointer(std::int16_t value) { Store(mousePointer_, value); }
+
+    // What a peer reports. Coordinates in the box's own scale.
+    void MouseDownInput(std::int16_t button, std::int16_t shift, float x, float y);
+    void MouseMoveInput(std::int16_t button, std::int16_t shift, float x, float y);
+    void MouseUpInput(std::int16_t button, std::int16_t shift, float x, float y);
+    void ClickInput();
+    void DblClickInput();
+    void KeyDownInput(std::int16_t keyCode, std::int16_t shift);
+    void KeyPressInput(std::int16_t keyAscii);
+    void KeyUpInput(std::int16_t keyCode, std::int16_t shift);
+
+    frame::Slot<std::int16_t, std::int16_t, float, float> MouseDown, MouseMove, MouseUp;
+    frame::Slot<> Click, DblClick;
+    frame::Slot<std::int16_t, std::int16_t> KeyDown, KeyUp;
+    frame::Slot<std::int16_t> KeyPress;
+
+    const frame::ClassTable& Table() const override;
+
+  protected:
+    frame::TextSize InnerSize() const override;
+    std::optional<frame::OLE_COLOR> PixelOf(int x, int y) const override;
+    void Wiped() override;
+    void LookChanged() override { Changed(); }
+    void Moved() override;
+
+  private:
+    float Border() const { return borderStyle_ != 0 ? 2 * frame::borderTwips : 0; }
+    frame::OLE_COLOR Background() const;
+    void FitPicture();
+
+    Raster raster_;
+    frame::PictureRef picture_;
+    bool autoSize_ = false;
+    std::int16_t borderStyle_ = 1, mousePointer_ = 0;
+};
+
+}  // namespace tessel::child
