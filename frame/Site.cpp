@@ -4,6 +4,8 @@
 
 namespace tessel::frame {
 
+Site::Site(frame::Host& host) : host_(host) {}
+
 Site::~Site() { Detach(); }
 
 void Site::SetPlace(float left, float top) {

@@ -38,7 +38,7 @@ class Siblings {
 /// each control; the site owns the control and its size.
 class Site {
   public:
-    explicit Site(frame::Host& host) : host_(host) {}
+    explicit Site(frame::Host& host);
     Site(const Site&) = delete;
     Site& operator=(const Site&) = delete;
     virtual ~Site();

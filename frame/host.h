@@ -343,6 +343,9 @@ class Entry {
         }
     }
 
+    Entry(const Entry&) = delete;
+    Entry& operator=(const Entry&) = delete;
+
   private:
     explicit Entry(Host& host) : host_(host) { ++host_.depth_; }
     ~Entry() {

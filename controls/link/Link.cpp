@@ -10,7 +10,12 @@ using frame::OLE_COLOR;
 using frame::Variant;
 using frame::VarType;
 
+namespace {
+constexpr frame::TextSize designSize{1215, 255};
+}
+
 Link::Link(frame::Host& host) : Control(host) {
+    Label1.Move(0, 0, designSize.width, designSize.height);
     Label1.SetCaption("Label1");
     Label1.SetForeColor(own.ForeColor);
     Label1.MouseDown.To<&Link::LabelMouseDown>(*this);
@@ -133,7 +138,7 @@ void Link::Show() {
     if (UserMode()) CopyToolTip();
 }
 
-frame::TextSize Link::DesignSize() const { return {1215, 255}; }
+frame::TextSize Link::DesignSize() const { return designSize; }
 
 void Link::LabelMouseDown(std::int16_t button, std::int16_t shift, float x, float y) {
     ForwardEvent(frame::stock::MouseDown, button, shift, x, y);
@@ -189,7 +194,7 @@ std::string Link::RunShell(const std::string& target, Verb verb) {
     if (target.empty()) return {};
     const int code = Host().Execute(verb == Verb::Print ? "print" : "open", target);
     if (code > greatestFailure) return {};
-    const std::string message = [&] {
+    std::string message = [&] {
         switch (code) {
             case 31:
                 return "No application associated with file";

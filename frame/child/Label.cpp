@@ -5,9 +5,7 @@
 
 namespace tessel::child {
 
-using frame::OLE_COLOR;
-
-Label::Label(frame::Control& owner, std::string name) : ChildControl(owner, std::move(name)) {
+Label::Label(frame::Control& owner, std::string name) : PointerChild(owner, std::move(name)) {
     font_.Set(std::make_shared<frame::Font>());
 }
 
@@ -37,22 +35,6 @@ void Label::SetBorderStyle(LabelBorderConstants value) {
 void Label::SetAppearance(AppearanceConstants value) {
     if (!Store(appearance_, value)) return;
     SetForeColor(value == AppearanceConstants::Flat ? frame::colors::windowText : frame::colors::buttonText);
-}
-
-void Label::MouseDownInput(std::int16_t button, std::int16_t shift, float x, float y) {
-    Enter("MouseDown", [&] { MouseDown(button, shift, x, y); });
-}
-void Label::MouseMoveInput(std::int16_t button, std::int16_t shift, float x, float y) {
-    Enter("MouseMove", [&] { MouseMove(button, shift, x, y); });
-}
-void Label::MouseUpInput(std::int16_t button, std::int16_t shift, float x, float y) {
-    Enter("MouseUp", [&] { MouseUp(button, shift, x, y); });
-}
-void Label::ClickInput() {
-    Enter("Click", [&] { Click(); });
-}
-void Label::DblClickInput() {
-    Enter("DblClick", [&] { DblClick(); });
 }
 
 void Label::Moved() { FitAndTell(); }
@@ -93,14 +75,7 @@ constexpr auto members =
              frame::property<&Label::BackColor, &Label::SetBackColor>("BackColor", "The colour behind the text."),
              frame::property<&Label::ForeColor, &Label::SetForeColor>("ForeColor", "The colour of the text."),
          });
-constexpr std::array inputs = {
-    frame::input<&Label::MouseDownInput>("MouseDown", {"Button", "Shift", "X", "Y"}),
-    frame::input<&Label::MouseMoveInput>("MouseMove", {"Button", "Shift", "X", "Y"}),
-    frame::input<&Label::MouseUpInput>("MouseUp", {"Button", "Shift", "X", "Y"}),
-    frame::input<&Label::ClickInput>("Click"),
-    frame::input<&Label::DblClickInput>("DblClick"),
-};
-constexpr frame::ClassTable table{.name = "Label", .members = members, .inputs = inputs, .defaultMember = "Caption"};
+constexpr frame::ClassTable table{.name = "Label", .members = members, .inputs = pointerInputs, .defaultMember = "Caption"};
 
 }  // namespace
 

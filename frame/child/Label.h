@@ -1,6 +1,6 @@
 #pragma once
 
-#include "frame/ChildControl.h"
+#include "frame/child/PointerChild.h"
 
 namespace tessel::child {
 
@@ -19,7 +19,7 @@ inline constexpr frame::Enumeration appearanceConstants{"AppearanceConstants", n
 
 /// A piece of text. With `AutoSize` it is always as large as its text: with `WordWrap` too it keeps its width and takes the
 /// height that the wrapped text needs.
-class Label final : public frame::ChildControl {
+class Label final : public PointerChild {
   public:
     Label(frame::Control& owner, std::string name);
 
@@ -44,16 +44,8 @@ class Label final : public frame::ChildControl {
     frame::OLE_COLOR ForeColor() const { return foreColor_; }
     void SetForeColor(frame::OLE_COLOR value) { Store(foreColor_, value); }
 
-    // What a peer reports. Coordinates in twips of the label; buttons 1 left, 2 right, 4 middle; shift 1, control 2, alt 4.
-    void MouseDownInput(std::int16_t button, std::int16_t shift, float x, float y);
-    void MouseMoveInput(std::int16_t button, std::int16_t shift, float x, float y);
-    void MouseUpInput(std::int16_t button, std::int16_t shift, float x, float y);
-    void ClickInput();
-    void DblClickInput();
-
-    // Where the events go. `Change` comes when the text is another, and when the label has changed its size by itself.
-    frame::Slot<std::int16_t, std::int16_t, float, float> MouseDown, MouseMove, MouseUp;
-    frame::Slot<> Click, DblClick, Change;
+    /// Comes when the text is another, and when the label has changed its size by itself.
+    frame::Slot<> Change;
 
     const frame::ClassTable& Table() const override;
 

@@ -8,7 +8,7 @@ namespace tessel::child {
 using frame::twipsPerPixel;
 
 PictureBox::PictureBox(frame::Control& owner, std::string name)
-    : ChildControl(owner, std::move(name)), DrawingSurface(owner.Host()), raster_(0, 0, BackColor()) {
+    : KeyChild(owner, std::move(name)), DrawingSurface(owner.Host()), raster_(0, 0, BackColor()) {
     SetFont(std::make_shared<frame::Font>());
     AddCanvas(raster_);
     AddCanvas(owner.Host().Peers().MakeCanvas(*this, *this));
@@ -36,31 +36,6 @@ void PictureBox::SetAutoSize(bool value) {
 
 void PictureBox::SetBorderStyle(std::int16_t value) {
     if (Store(borderStyle_, value)) Moved();
-}
-
-void PictureBox::MouseDownInput(std::int16_t button, std::int16_t shift, float x, float y) {
-    Enter("MouseDown", [&] { MouseDown(button, shift, x, y); });
-}
-void PictureBox::MouseMoveInput(std::int16_t button, std::int16_t shift, float x, float y) {
-    Enter("MouseMove", [&] { MouseMove(button, shift, x, y); });
-}
-void PictureBox::MouseUpInput(std::int16_t button, std::int16_t shift, float x, float y) {
-    Enter("MouseUp", [&] { MouseUp(button, shift, x, y); });
-}
-void PictureBox::ClickInput() {
-    Enter("Click", [&] { Click(); });
-}
-void PictureBox::DblClickInput() {
-    Enter("DblClick", [&] { DblClick(); });
-}
-void PictureBox::KeyDownInput(std::int16_t keyCode, std::int16_t shift) {
-    Enter("KeyDown", [&] { KeyDown(keyCode, shift); });
-}
-void PictureBox::KeyPressInput(std::int16_t keyAscii) {
-    Enter("KeyPress", [&] { KeyPress(keyAscii); });
-}
-void PictureBox::KeyUpInput(std::int16_t keyCode, std::int16_t shift) {
-    Enter("KeyUp", [&] { KeyUp(keyCode, shift); });
 }
 
 frame::TextSize PictureBox::InnerSize() const {
@@ -98,17 +73,7 @@ constexpr auto members = Join(
         frame::property<&PictureBox::MousePointer, &PictureBox::SetMousePointer>("MousePointer",
                                                                                  "The pointer's shape over the box."),
     });
-constexpr std::array inputs = {
-    frame::input<&PictureBox::MouseDownInput>("MouseDown", {"Button", "Shift", "X", "Y"}),
-    frame::input<&PictureBox::MouseMoveInput>("MouseMove", {"Button", "Shift", "X", "Y"}),
-    frame::input<&PictureBox::MouseUpInput>("MouseUp", {"Button", "Shift", "X", "Y"}),
-    frame::input<&PictureBox::ClickInput>("Click"),
-    frame::input<&PictureBox::DblClickInput>("DblClick"),
-    frame::input<&PictureBox::KeyDownInput>("KeyDown", {"KeyCode", "Shift"}),
-    frame::input<&PictureBox::KeyPressInput>("KeyPress", {"KeyAscii"}),
-    frame::input<&PictureBox::KeyUpInput>("KeyUp", {"KeyCode", "Shift"}),
-};
-constexpr frame::ClassTable table{.name = "PictureBox", .members = members, .inputs = inputs, .defaultMember = "Picture"};
+constexpr frame::ClassTable table{.name = "PictureBox", .members = members, .inputs = keyInputs, .defaultMember = "Picture"};
 
 }  // namespace
 

@@ -1,14 +1,14 @@
 #pragma once
 
-#include "frame/ChildControl.h"
 #include "frame/Surface.h"
+#include "frame/child/PointerChild.h"
 #include "frame/child/Raster.h"
 
 namespace tessel::child {
 
 /// A box that is drawn on and that keeps what was drawn: its pixels at scale 1 can be read back with `Point`, and `Image` gives
 /// them as a picture. Its size is in its owner's twips, its inside in its own scale.
-class PictureBox final : public frame::ChildControl, public frame::DrawingSurface {
+class PictureBox final : public KeyChild, public frame::DrawingSurface {
   public:
     PictureBox(frame::Control& owner, std::string name);
 
@@ -24,21 +24,6 @@ class PictureBox final : public frame::ChildControl, public frame::DrawingSurfac
     void SetBorderStyle(std::int16_t value);
     std::int16_t MousePointer() const { return mousePointer_; }
     void SetMousePointer(std::int16_t value) { Store(mousePointer_, value); }
-
-    // What a peer reports. Coordinates in the box's own scale.
-    void MouseDownInput(std::int16_t button, std::int16_t shift, float x, float y);
-    void MouseMoveInput(std::int16_t button, std::int16_t shift, float x, float y);
-    void MouseUpInput(std::int16_t button, std::int16_t shift, float x, float y);
-    void ClickInput();
-    void DblClickInput();
-    void KeyDownInput(std::int16_t keyCode, std::int16_t shift);
-    void KeyPressInput(std::int16_t keyAscii);
-    void KeyUpInput(std::int16_t keyCode, std::int16_t shift);
-
-    frame::Slot<std::int16_t, std::int16_t, float, float> MouseDown, MouseMove, MouseUp;
-    frame::Slot<> Click, DblClick;
-    frame::Slot<std::int16_t, std::int16_t> KeyDown, KeyUp;
-    frame::Slot<std::int16_t> KeyPress;
 
     const frame::ClassTable& Table() const override;
 

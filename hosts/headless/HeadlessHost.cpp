@@ -19,9 +19,10 @@ class HeadlessSite::ExtenderObject final : public HostObject {
         return HostObject::Get(key, arguments);
     }
     void Put(frame::MemberKey key, const Variant& value, frame::Arguments arguments = {}) override {
-        if (const auto* own = Own().Find(key))
+        if (const auto* own = Own().Find(key)) {
+            if (!own->set) throw frame::ControlError(frame::errors::notAtRunTime);
             own->set(*this, arguments, value);
-        else if (!key.ByNumber() && frame::EqualsNoCase(key.Name(), "ToolTipText"))
+        } else if (!key.ByNumber() && frame::EqualsNoCase(key.Name(), "ToolTipText"))
             SetMember("ToolTipText", value);
         else
             HostObject::Put(key, value, arguments);
@@ -114,12 +115,7 @@ HeadlessForm::HeadlessForm(HeadlessHost& host, const std::string& name, Members 
     SetMember("Picture", frame::ObjectRef());
     SetMember("MouseIcon", frame::ObjectRef());
     SetMember("MousePointer", std::int16_t{0});
-    for (auto& [key, value] : members) {
-        if (Has(key))
-            Put(key, value);
-        else
-            SetMember(key, std::move(value));
-    }
+    Take(std::move(members));
 }
 
 frame::Object& HeadlessForm::Item(int index) {
@@ -242,10 +238,14 @@ HeadlessSite* HeadlessHost::FindSite(std::string_view name) {
 void HeadlessHost::Destroy(frame::Control& control) {
     const auto found = std::find_if(sites_.begin(), sites_.end(), [&](const auto& site) { return &site->Control() == &control; });
     if (found == sites_.end()) return;
-    for (const auto& form : forms_) form->Remove(control);
+    TakeOffForms(control);
     auto site = std::move(*found);
     sites_.erase(found);
     host_->Retire(std::move(site));
+}
+
+void HeadlessHost::TakeOffForms(const frame::Object& object) {
+    for (const auto& form : forms_) form->Remove(object);
 }
 
 frame::MemoryBag HeadlessHost::Save(frame::Control& control) {

@@ -118,6 +118,8 @@ class HeadlessHost {
     HeadlessSite* SiteOf(const frame::Control& control);
     HeadlessSite* FindSite(std::string_view name);
     void Destroy(frame::Control& control);
+    /// Takes an object off the form that it stands on.
+    void TakeOffForms(const frame::Object& object);
 
     /// What a control writes when its design is saved.
     frame::MemoryBag Save(frame::Control& control);

@@ -1,6 +1,7 @@
 #include "hosts/headless/HostObject.h"
 
 #include <algorithm>
+#include <functional>
 
 #include "frame/ClassTable.h"
 #include "frame/Error.h"
@@ -59,8 +60,14 @@ void HostObject::SetMember(std::string_view name, Variant value) {
 SurfaceObject::SurfaceObject(frame::Host& host, std::string path, Members members)
     : HostObject(std::move(path), {}), DrawingSurface(host) {
     AddCanvas(host.Peers().MakeCanvas(*this, *this));
+    Take(std::move(members));
+}
+
+void SurfaceObject::Take(Members members) {
+    const auto isScaleMode = [](const auto& member) { return frame::EqualsNoCase(member.first, "ScaleMode"); };
+    std::stable_partition(members.begin(), members.end(), std::not_fn(isScaleMode));
     for (auto& [name, value] : members) {
-        if (drawingTable.Find(std::string_view(name)))
+        if (Has(std::string_view(name)))
             Put(name, value);
         else
             SetMember(name, std::move(value));

@@ -55,6 +55,8 @@ class SurfaceObject : public HostObject, public frame::DrawingSurface {
 
   protected:
     frame::TextSize InnerSize() const override { return inner_; }
+    /// Sets what is given, the scale mode last: sizes are given in twips, whatever the mode.
+    void Take(Members members);
 
   private:
     frame::TextSize inner_{12'000, 9'000};

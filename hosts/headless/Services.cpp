@@ -168,12 +168,14 @@ std::vector<std::size_t> WrappedLengths(std::string_view line, std::size_t limit
 
 frame::TextSize FixedMetrics::Measure(const frame::Font&, std::string_view text, std::optional<float> wrapWidth) {
     constexpr float characterWidth = 6 * 15, lineHeight = 13 * 15;
+    constexpr float widestLine = 1e9f;  // in characters; below what a size_t holds
     std::vector<std::size_t> lengths;
     for (std::size_t start = 0; start <= text.size();) {
         const std::size_t end = std::min(text.find('\n', start), text.size());
         const std::string_view line = text.substr(start, end - start);
         if (wrapWidth) {
-            const auto wrapped = WrappedLengths(line, static_cast<std::size_t>(std::max(1.0f, *wrapWidth / characterWidth)));
+            const float limit = std::min(std::max(1.0f, *wrapWidth / characterWidth), widestLine);
+            const auto wrapped = WrappedLengths(line, static_cast<std::size_t>(limit));
             lengths.insert(lengths.end(), wrapped.begin(), wrapped.end());
         } else {
             lengths.push_back(frame::CharacterCount(line));
