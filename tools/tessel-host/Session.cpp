@@ -20,6 +20,7 @@ namespace {
 
 constexpr int deepestRequest = 100;   // requests inside handlers of requests
 constexpr int deepestNesting = 1000;  // brackets inside brackets
+constexpr int mostFields = 1000;      // of one JSON object: they are looked up one by one
 
 [[noreturn]] void Refuse(const std::string& why) { throw ControlError(frame::errors::invalidCall, why); }
 
@@ -41,6 +42,13 @@ std::string TextOf(const Json& json, const char* name) {
 
 std::string RequiredText(const Json& request, const char* name) { return TextOf(Required(request, name), name); }
 
+/// The name of something new.
+std::string NameIn(const Json& request) {
+    std::string name = RequiredText(request, "name");
+    if (name.empty()) Refuse("\"name\" must not be empty");
+    return name;
+}
+
 const Json& ListIn(const Json& request, const char* name) {
     static const Json none = Json::array();
     const Json* field = FieldOf(request, name);
@@ -61,8 +69,30 @@ bool FlagIn(const Json& request, const char* name, bool otherwise) {
     return field->get<bool>();
 }
 
+/// An ambient font is never nothing: null stands for the default one.
+frame::FontRef FontFrom(const Variant& value) {
+    auto font = frame::FromVariant<frame::FontRef>(value);
+    return font ? font : std::make_shared<frame::Font>();
+}
+
 Json ErrorReply(const ControlError& error) {
     return {{"error", {{"number", error.Number()}, {"description", frame::ToStrictUtf8(error.Description())}}}};
+}
+
+/// A line as JSON, within the limits.
+Json Parse(std::string_view line) {
+    if (!frame::IsValidUtf8(line)) Refuse("The request is no valid UTF-8");
+    std::vector<int> fields;  // of the objects that are open
+    const auto check = [&](int depth, Json::parse_event_t event, const Json&) {
+        if (depth > deepestNesting) Refuse("The request is nested too deep");
+        if (event == Json::parse_event_t::object_start) fields.push_back(0);
+        if (event == Json::parse_event_t::object_end) fields.pop_back();
+        if (event == Json::parse_event_t::key && ++fields.back() > mostFields) Refuse("An object has too many fields");
+        return true;
+    };
+    Json request = Json::parse(line, check, false);
+    if (request.is_discarded()) Refuse("The request is no valid JSON");
+    return request;
 }
 
 }  // namespace
@@ -106,7 +136,7 @@ class Session::ScreenObject final : public frame::Object {
     headless::FixedApplication& application_;
 };
 
-Session::Session() {
+Session::Session(int mostRequests) : mostRequests_(mostRequests) {
     modules_.push_back(std::make_unique<ApplicationObject>(host_.application));
     modules_.push_back(std::make_unique<ScreenObject>(host_.application));
     finder_.byPath = [this](const std::string& path) { return Find(path); };
@@ -116,14 +146,14 @@ Session::Session() {
 Session::~Session() = default;
 
 std::string Session::Answer(std::string_view line) {
-    if (!frame::IsValidUtf8(line))
-        return Reply(ErrorReply(ControlError(frame::errors::invalidCall, "The request is no valid UTF-8")));
-    bool tooDeep = false;
-    const auto keep = [&](int depth, Json::parse_event_t, Json&) { return depth <= deepestNesting || !(tooDeep = true); };
-    const Json request = Json::parse(line, keep, false);
-    if (tooDeep) return Reply(ErrorReply(ControlError(frame::errors::invalidCall, "The request is nested too deep")));
-    if (request.is_discarded()) return Reply(ErrorReply(ControlError(frame::errors::invalidCall, "The request is no valid JSON")));
-    return Reply(Carry(request));
+    ran_ = 0;
+    try {
+        return Reply(Carry(Parse(line)));
+    } catch (const ControlError& error) {
+        return Reply(ErrorReply(error));
+    } catch (const std::bad_alloc&) {
+        return Reply(ErrorReply(ControlError(frame::errors::outOfMemory)));
+    }
 }
 
 std::string Session::AnswerTooLong() {
@@ -138,23 +168,28 @@ std::string Session::Reply(Json reply) {
 }
 
 Json Session::Carry(const Request& request) {
-    const std::size_t reported = host_.errors.reports.size();
-    try {
-        Json value = Value(request);
+    auto& reports = host_.errors.reports;
+    const std::size_t reported = reports.size();
+    Json reply = Attempt(request);
+    if (reports.size() > reported) {
         // An error that left a control inside its own event has no other way to the script than this reply.
-        if (host_.errors.reports.size() > reported) {
-            const ControlError error = host_.errors.reports[reported].error;
-            host_.errors.reports.erase(host_.errors.reports.begin() + static_cast<std::ptrdiff_t>(reported),
-                                       host_.errors.reports.end());
-            return ErrorReply(error);
-        }
-        return {{"value", std::move(value)}};
+        if (!reply.contains("error")) reply = ErrorReply(reports[reported].error);
+        reports.erase(reports.begin() + static_cast<std::ptrdiff_t>(reported), reports.end());
+    }
+    return reply;
+}
+
+Json Session::Attempt(const Request& request) {
+    try {
+        return {{"value", Value(request)}};
     } catch (const ControlError& error) {
         return ErrorReply(error);
     } catch (const Json::exception& error) {
         return ErrorReply(ControlError(frame::errors::typeMismatch, error.what()));
     } catch (const std::bad_alloc&) {
         return ErrorReply(ControlError(frame::errors::outOfMemory));
+    } catch (const std::exception& error) {
+        return ErrorReply(ControlError(frame::errors::internal, error.what()));
     }
 }
 
@@ -188,19 +223,19 @@ Json Session::Form(const Request& request) {
     for (const auto& entry : request.items())
         if (entry.key() != "do" && entry.key() != "name")
             members.emplace_back(frame::FromStrictUtf8(entry.key()), From(entry.value()));
-    const std::string name = RequiredText(request, "name");
+    const std::string name = NameIn(request);
     if (Root(name).Get() && !EqualsNoCase(host_.Form().Path(), name)) throw ControlError(frame::errors::keyInUse);
     host_.NewForm(name, std::move(members));
     return frame::ToStrictUtf8(name);
 }
 
 Json Session::Sibling(const Request& request) {
-    const std::string name = RequiredText(request, "name");
+    const std::string name = NameIn(request);
     HostObject::Members members{{"Name", name}};
     std::string path = name;
     if (const Json* index = FieldOf(request, "index"); index && !index->is_null()) {
-        const Variant number = From(*index);
-        path += "(" + number.ToText() + ")";
+        const std::int32_t number = From(*index).ToLong();
+        path += "(" + frame::Decimal(number) + ")";
         members.emplace_back("Index", number);
     }
     if (Root(path).Get()) throw ControlError(frame::errors::keyInUse);
@@ -222,8 +257,8 @@ Json Session::Create(const Request& request) {
     const std::string className = RequiredText(request, "class");
     const frame::ControlClass* controlClass = controls::FindControlClass(className);
     if (!controlClass) Refuse("Unknown class \"" + className + "\"");
-    const std::string name = RequiredText(request, "name");
-    if (name.empty() || Root(name).Get()) throw ControlError(frame::errors::keyInUse);
+    const std::string name = NameIn(request);
+    if (Root(name).Get()) throw ControlError(frame::errors::keyInUse);
 
     headless::Placing placing;
     if (const Json* mode = FieldOf(request, "mode")) {
@@ -242,7 +277,7 @@ Json Session::Create(const Request& request) {
     if (const Json* ambient = FieldOf(request, "ambient")) {
         for (const auto& [key, value] : MembersFrom(ObjectIn(*ambient, "ambient"))) {
             if (EqualsNoCase(key, "Font"))
-                placing.ambientFont = frame::FromVariant<frame::FontRef>(value);
+                placing.ambientFont = FontFrom(value);
             else if (EqualsNoCase(key, "DisplayName"))
                 placing.displayName = value.ToText();
             else
@@ -298,6 +333,7 @@ Json Session::Destroy(const Request& request) {
     const auto sibling =
         std::find_if(siblings_.begin(), siblings_.end(), [&](const auto& object) { return EqualsNoCase(object->Path(), name); });
     if (sibling == siblings_.end()) throw ControlError(frame::errors::objectRequired, "There is no object \"" + name + "\"");
+    host_.TakeOffForms(**sibling);
     siblings_.erase(sibling);
     return nullptr;
 }
@@ -317,7 +353,7 @@ Json Session::Ambient(const Request& request) {
     if (EqualsNoCase(name, "UserMode"))
         site.SetUserMode(value.ToBoolean());
     else if (EqualsNoCase(name, "Font"))
-        site.SetAmbientFont(frame::FromVariant<frame::FontRef>(value));
+        site.SetAmbientFont(FontFrom(value));
     else if (EqualsNoCase(name, "DisplayName"))
         site.SetDisplayName(value.ToText());
     else
@@ -330,7 +366,11 @@ namespace {
 
 /// A member's name, or its dispatch number.
 frame::MemberKey KeyOf(const Json& name) {
-    if (name.is_number_integer()) return name.get<int>();
+    if (name.is_number_integer()) {
+        const auto number = name.get<std::int64_t>();
+        if (number != static_cast<int>(number)) throw ControlError(frame::errors::noSuchMember);
+        return static_cast<int>(number);
+    }
     if (!name.is_string()) Refuse("\"name\" must be a string or a number");
     return std::string_view(name.get_ref<const std::string&>());
 }
@@ -338,20 +378,20 @@ frame::MemberKey KeyOf(const Json& name) {
 }  // namespace
 
 Json Session::Get(const Request& request) {
-    frame::Object& object = Target(request);
+    const frame::ObjectRef object = Target(request);
     const frame::MemberKey key = KeyOf(Required(request, "name"));
     auto arguments = Arguments(request);
-    frame::Object& holder = Holder(object, key);
+    frame::Object& holder = Holder(*object, key);
     if (!key.ByNumber() && arguments.empty() && !holder.Has(key))
-        if (const frame::ObjectRef inner = object.Inner(key.Name()); inner.Get()) return ToJson(inner);
+        if (const frame::ObjectRef inner = object->Inner(key.Name()); inner.Get()) return ToJson(inner);
     return ToJson(holder.Get(key, arguments));
 }
 
 Json Session::Put(const Request& request) {
-    frame::Object& object = Target(request);
+    const frame::ObjectRef object = Target(request);
     const frame::MemberKey key = KeyOf(Required(request, "name"));
     auto arguments = Arguments(request);
-    Holder(object, key).Put(key, From(Required(request, "value")), arguments);
+    Holder(*object, key).Put(key, From(Required(request, "value")), arguments);
     return nullptr;
 }
 
@@ -369,22 +409,22 @@ Json WithArguments(Json result, const frame::Member& member, const std::vector<V
 }  // namespace
 
 Json Session::Call(const Request& request) {
-    frame::Object& object = Target(request);
+    const frame::ObjectRef object = Target(request);
     const frame::MemberKey key = KeyOf(Required(request, "name"));
     auto arguments = Arguments(request);
-    frame::Object& holder = Holder(object, key);
+    frame::Object& holder = Holder(*object, key);
     const frame::Member* member = holder.Table().Find(key);
     Json result = ToJson(holder.Call(key, arguments));
     return member ? WithArguments(std::move(result), *member, arguments) : result;
 }
 
 Json Session::Fire(const Request& request) {
-    frame::Object& object = Target(request);
+    const frame::ObjectRef object = Target(request);
     const std::string event = RequiredText(request, "event");
-    const frame::Member* input = object.Table().FindInput(event);
-    if (!input) throw ControlError(frame::errors::noSuchMember, "\"" + event + "\" is no event of " + object.Path());
+    const frame::Member* input = object->Table().FindInput(event);
+    if (!input) throw ControlError(frame::errors::noSuchMember, "\"" + event + "\" is no event of " + object->Path());
     auto arguments = Arguments(request);
-    const Json result = WithArguments(ToJson(input->call(object, arguments)), *input, arguments);
+    const Json result = WithArguments(ToJson(input->call(*object, arguments)), *input, arguments);
     return result.is_object() && result.contains("args") ? result["args"] : result;
 }
 
@@ -413,13 +453,19 @@ Json Session::Handle(const Request& request) {
 Json Session::Advance(const Request& request) {
     constexpr double longest = 1e12;
     const double milliseconds = From(Required(request, "ms")).ToDouble();
-    if (!(milliseconds >= 0 && milliseconds <= longest)) Refuse("\"ms\" must be a number of milliseconds, 0 or more");
+    if (!(milliseconds >= 0 && milliseconds <= longest)) Refuse("\"ms\" must be from 0 to 1e12 milliseconds");
     host_.clock.Advance(static_cast<std::int64_t>(milliseconds));
     return nullptr;
 }
 
 Json Session::Random(const Request& request) {
-    for (const Json& value : ListIn(request, "values")) host_.random.queue.push_back(From(value).ToSingle());
+    std::vector<float> values;
+    for (const Json& value : ListIn(request, "values")) {
+        const float number = From(value).ToSingle();
+        if (!(number >= 0 && number <= 1)) Refuse("A random number is from 0 to 1");
+        values.push_back(number);
+    }
+    host_.random.queue.insert(host_.random.queue.end(), values.begin(), values.end());
     return nullptr;
 }
 
@@ -508,11 +554,7 @@ frame::ObjectRef Session::Find(const std::string& path) {
     return object.Get() ? object : missing();
 }
 
-frame::Object& Session::Target(const Request& request) {
-    // A value-like object lives only as long as someone holds it: for the length of this request.
-    held_ = Find(RequiredText(request, "of"));
-    return *held_;
-}
+frame::ObjectRef Session::Target(const Request& request) { return Find(RequiredText(request, "of")); }
 
 headless::HeadlessSite& Session::SiteOf(const Request& request) {
     const std::string name = RequiredText(request, "of");
@@ -522,7 +564,7 @@ headless::HeadlessSite& Session::SiteOf(const Request& request) {
 }
 
 frame::Object& Session::Holder(frame::Object& object, frame::MemberKey key) {
-    if (object.Has(key)) return object;
+    if (key.ByNumber() || object.Has(key)) return object;  // the host's own members have names alone
     const auto* control = dynamic_cast<const frame::Control*>(&object);
     auto* site = control ? host_.SiteOf(*control) : nullptr;
     return site && site->Extender().Has(key) ? site->Extender() : object;
@@ -557,16 +599,15 @@ void Session::OnEvent(const std::string& object, const frame::EventInfo& event, 
     };
     for (const auto& entry : handler->when.items())
         if (!(argumentNamed(entry.key()).Get() == From(entry.value()))) return;
-    if (handler->times && (*handler->times)-- <= 0) {
-        handler->times = 0;
-        return;
-    }
+    if (handler->times && *handler->times <= 0) return;
+    if (handler->times) --*handler->times;
     for (const auto& entry : handler->set.items()) argumentNamed(entry.key()).Set(From(entry.value()));
     RunAll(handler->run);
 }
 
 void Session::RunAll(const Json& requests) {
     for (const Json& request : requests) {
+        if (++ran_ > mostRequests_) Refuse("One line sets off too many requests");
         Json reply = Carry(request);
         GatherLog();
         log_.push_back({"reply", std::move(reply)});

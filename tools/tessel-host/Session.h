@@ -17,7 +17,8 @@ namespace tessel::tools {
 /// cannot be understood or done gets an error reply.
 class Session {
   public:
-    Session();
+    /// `mostRequests` bounds what one line may set off: the requests inside handlers and forms.
+    explicit Session(int mostRequests = 100'000);
     ~Session();
 
     /// Carries out one line and gives the reply as one line, without its end.
@@ -34,6 +35,7 @@ class Session {
     std::string Reply(Json reply);
     /// Carries out a request: its value, or its error.
     Json Carry(const Request& request);
+    Json Attempt(const Request& request);
     Json Value(const Request& request);
 
     // The requests.
@@ -61,7 +63,8 @@ class Session {
     // Objects.
     frame::ObjectRef Root(std::string_view name);
     frame::ObjectRef Find(const std::string& path);
-    frame::Object& Target(const Request& request);
+    /// The object that a request names. To be held while it is used: a value-like object lives only as long as someone does.
+    frame::ObjectRef Target(const Request& request);
     headless::HeadlessSite& SiteOf(const Request& request);
     /// The object that has the member: the control itself, or the host's own members for it.
     frame::Object& Holder(frame::Object& object, frame::MemberKey key);
@@ -82,9 +85,10 @@ class Session {
     std::vector<std::unique_ptr<frame::Object>> modules_;
     std::map<std::string, std::shared_ptr<Handler>> handlers_;  // by object and event, in lower case
     ObjectFinder finder_;
-    frame::ObjectRef held_;  // the object that the latest request names
     Json log_ = Json::array();
+    const int mostRequests_;
     int depth_ = 0;  // requests that are running one inside the other
+    int ran_ = 0;    // requests that the present line has set off
 };
 
 }  // namespace tessel::tools
