@@ -15,6 +15,7 @@
 namespace tessel::frame {
 namespace {
 
+using namespace std::string_literals;
 using namespace std::string_view_literals;
 using testing::ElementsAre;
 
@@ -587,6 +588,65 @@ TEST(Decimal, WritesTheDigitsAndTheSign) {
 TEST(Decimal, WritesTheSmallestAndTheLargestNumber) {
     EXPECT_EQ(Decimal(std::numeric_limits<std::int64_t>::min()), "-9223372036854775808");
     EXPECT_EQ(Decimal(std::numeric_limits<std::int64_t>::max()), "9223372036854775807");
+}
+
+// Strict UTF-8
+
+TEST(ToStrictUtf8, LeavesValidTextUnchanged) {
+    const std::string texts[] = {"",
+                                 "plain\t\n\x7F",
+                                 "a\0b"s,
+                                 "\u00E4\u20AC\uD7FF\uE000\uFFFD\uFFFF",
+                                 "\U00010000\U0001F600",
+                                 "\U0010FF00\U0010FF7F",
+                                 "\U000FFFFF\U00100000"};
+    for (const std::string& text : texts) {
+        EXPECT_EQ(ToStrictUtf8(text), text);
+        EXPECT_EQ(FromStrictUtf8(text), text);
+    }
+}
+
+TEST(ToStrictUtf8, WritesEachInvalidByteAsACharacterOfItsOwn) {
+    EXPECT_EQ(ToStrictUtf8("\x80"), "\U0010FF80");
+    EXPECT_EQ(ToStrictUtf8("a\xFF\xE2\x82z"), "a\U0010FFFF\U0010FFE2\U0010FF82z");
+    EXPECT_EQ(ToStrictUtf8("\xED\xA0\x80"), "\U0010FFED\U0010FFA0\U0010FF80");
+}
+
+TEST(ToStrictUtf8, WritesTheCharactersThatStandForBytesByteByByte) {
+    EXPECT_EQ(ToStrictUtf8("\U0010FF80"), "\U0010FFF4\U0010FF8F\U0010FFBE\U0010FF80");
+}
+
+TEST(ToStrictUtf8, TellsAnInvalidByteFromTheCharacterThatStandsForIt) {
+    EXPECT_NE(ToStrictUtf8("\x80"), ToStrictUtf8("\U0010FF80"));
+}
+
+TEST(FromStrictUtf8, BringsBackEveryInvalidByte) {
+    for (int byte = 0x80; byte < 0x100; ++byte) {
+        const std::string text = "a" + std::string(1, static_cast<char>(byte)) + "z";
+        EXPECT_TRUE(IsValidUtf8(ToStrictUtf8(text)));
+        EXPECT_EQ(FromStrictUtf8(ToStrictUtf8(text)), text);
+    }
+}
+
+TEST(FromStrictUtf8, BringsBackTheCharactersThatStandForBytes) {
+    std::string all;
+    for (char32_t character = 0x10FF80; character <= 0x10FFFF; ++character) {
+        EXPECT_EQ(FromStrictUtf8(ToStrictUtf8(Utf8(character))), Utf8(character));
+        all += Utf8(character) + "\x80";
+    }
+    EXPECT_TRUE(IsValidUtf8(ToStrictUtf8(all)));
+    EXPECT_EQ(FromStrictUtf8(ToStrictUtf8(all)), all);
+}
+
+TEST(FromStrictUtf8, BringsBackAnyBytes) {
+    std::mt19937 numbers(6);
+    for (int round = 0; round < 20'000; ++round) {
+        std::string bytes = RandomBytes(numbers);
+        if (round % 3 == 0) bytes += Utf8(0x10FF80 + numbers() % 0x80) + RandomBytes(numbers);
+        const std::string strict = ToStrictUtf8(bytes);
+        ASSERT_TRUE(IsValidUtf8(strict)) << testing::PrintToString(bytes);
+        ASSERT_EQ(FromStrictUtf8(strict), bytes);
+    }
 }
 
 }  // namespace

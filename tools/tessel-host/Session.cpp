@@ -462,7 +462,7 @@ Json Session::Random(const Request& request) {
     std::vector<float> values;
     for (const Json& value : ListIn(request, "values")) {
         const float number = From(value).ToSingle();
-        if (!(number >= 0 && number <= 1)) Refuse("A random number is from 0 to 1");
+        if (!(number >= 0 && number < 1)) Refuse("A random number is at least 0 and below 1");
         values.push_back(number);
     }
     host_.random.queue.insert(host_.random.queue.end(), values.begin(), values.end());
