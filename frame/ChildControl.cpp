@@ -34,7 +34,9 @@ void ChildControl::Place(float left, float top, float width, float height) {
 
 void ChildControl::AttachPeer(std::unique_ptr<frame::Peer> peer) {
     peer_ = std::move(peer);
-    if (peer_) Changed();
+    if (!peer_) return;
+    PeerAttached();
+    Changed();
 }
 
 void ChildControl::Changed() {

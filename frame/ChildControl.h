@@ -53,6 +53,8 @@ class ChildControl : public Object {
     frame::Peer* Peer() const { return peer_.get(); }
 
   protected:
+    /// A peer has come that will follow from now on.
+    virtual void PeerAttached() {}
     /// The place or size has changed. A child that sizes itself answers here.
     virtual void Moved() {}
     /// Remembers that the peer has something to follow.

@@ -36,6 +36,12 @@ void Control::WriteProperties(PropertyBag& bag) const {
 
 FontRef Control::AmbientFont() const { return site_ ? site_->Ambient().Font() : std::make_shared<Font>(); }
 
+void Control::PropertyChanged(std::string_view key) const {
+    if (!site_) return;
+    const Callout callout(host_);
+    site_->PropertyChanged(key);
+}
+
 void Control::RefuseAtDesignTime() const {
     if (!UserMode()) throw ControlError(errors::notPermitted);
 }
@@ -53,6 +59,10 @@ Object& Control::Extender() const {
 void Control::TakePeers() {
     for (ChildControl* child : children_) child->AttachPeer(host_.Peers().MakePeer(*child));
     surface_.AddCanvas(host_.Peers().MakeCanvas(surface_, *this));
+}
+
+void Control::DropPeers() {
+    for (ChildControl* child : children_) child->AttachPeer(nullptr);
 }
 
 Variant BagDefault::For(const Control& control) const {

@@ -61,9 +61,7 @@ class Control : public Object {
 
   protected:
     /// Tells the host that a property has changed, by its bag key.
-    void PropertyChanged(std::string_view key) const {
-        if (site_) site_->PropertyChanged(key);
-    }
+    void PropertyChanged(std::string_view key) const;
     /// Raises an event and returns when the host's handlers have. Afterwards anything may have changed, this control's own
     /// state and life in its host included.
     template <class... Args>
@@ -97,6 +95,8 @@ class Control : public Object {
     void AddChild(ChildControl& child) { children_.push_back(&child); }
     void RemoveChild(ChildControl& child) { std::erase(children_, &child); }
     void TakePeers();
+    /// Before the children go: a peer may still look at its child.
+    void DropPeers();
 
     frame::Host& host_;
     frame::Site* site_ = nullptr;

@@ -67,7 +67,11 @@ void Host::Unhandled(const ControlError& error, const std::string& where) { serv
 
 void Host::Flush() {
     if (flushing_) return;
-    flushing_ = true;
+    struct Flushing {
+        explicit Flushing(bool& running) : flag(running) { flag = true; }
+        ~Flushing() { flag = false; }
+        bool& flag;
+    } const running(flushing_);
     const Callout callout(*this);
     while (!touched_.empty()) {
         ChildControl* child = touched_.back();
@@ -75,7 +79,6 @@ void Host::Flush() {
         child->touched_ = false;
         if (child->peer_) child->peer_->Update();
     }
-    flushing_ = false;
 }
 
 void Host::Touch(ChildControl& child) {

@@ -6,7 +6,10 @@ namespace tessel::frame {
 
 Site::Site(frame::Host& host) : host_(host) {}
 
-Site::~Site() { Detach(); }
+Site::~Site() {
+    Detach();
+    if (control_) control_->DropPeers();
+}
 
 void Site::SetPlace(float left, float top) {
     if (left == left_ && top == top_) return;

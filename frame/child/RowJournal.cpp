@@ -1,0 +1,66 @@
+#include "frame/child/RowJournal.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace tessel::child {
+
+using Kind = RowChange::Kind;
+
+void RowJournal::Inserted(std::uint32_t position) {
+    if (IsReset()) return;
+    if (RowChange* last = Last(Kind::Inserted); last && position >= last->first && position - last->first <= last->count)
+        ++last->count;
+    else
+        Add({Kind::Inserted, position, 1});
+}
+
+void RowJournal::Removed(std::uint32_t position) {
+    if (IsReset()) return;
+    if (RowChange* last = Last(Kind::Inserted); last && position >= last->first && position - last->first < last->count) {
+        if (--last->count == 0) changes_.pop_back();
+    } else if (last = Last(Kind::Removed); last && (position == last->first || position + 1 == last->first)) {
+        last->first = position;
+        ++last->count;
+    } else {
+        Add({Kind::Removed, position, 1});
+    }
+}
+
+void RowJournal::Changed(std::uint32_t first, std::uint32_t count) {
+    if (IsReset()) return;
+    const std::uint32_t end = first + count;
+    if (RowChange* last = Last(Kind::Inserted); last && first >= last->first && end <= last->first + last->count) return;
+    if (RowChange* last = Last(Kind::Changed); last && first <= last->first + last->count && end >= last->first) {
+        const std::uint32_t lastEnd = std::max(end, last->first + last->count);
+        last->first = std::min(first, last->first);
+        last->count = lastEnd - last->first;
+    } else {
+        Add({Kind::Changed, first, count});
+    }
+}
+
+void RowJournal::Reset() { changes_.assign(1, {Kind::Reset, 0, 0}); }
+
+std::vector<RowChange> RowJournal::Take() { return std::exchange(changes_, {}); }
+
+RowChange* RowJournal::Last(Kind kind) { return !changes_.empty() && changes_.back().kind == kind ? &changes_.back() : nullptr; }
+
+void RowJournal::Add(RowChange change) {
+    changes_.push_back(change);
+    if (changes_.size() > limit) Shorten();
+}
+
+void RowJournal::Shorten() {
+    const auto isChanged = [](const RowChange& change) { return change.kind == Kind::Changed; };
+    if (!std::all_of(changes_.begin(), changes_.end(), isChanged)) return Reset();
+    RowChange all = changes_.front();
+    for (const RowChange& change : changes_) {
+        const std::uint32_t end = std::max(all.first + all.count, change.first + change.count);
+        all.first = std::min(all.first, change.first);
+        all.count = end - all.first;
+    }
+    changes_.assign(1, all);
+}
+
+}  // namespace tessel::child
