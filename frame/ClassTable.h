@@ -89,10 +89,11 @@ template <auto Own, auto Field>
 constexpr BagKey key(std::string_view name, BagDefault onLoad, std::optional<BagDefault> onSave = {}) {
     using C = typename detail::DataMember<decltype(Own)>::Class;
     using T = typename detail::DataMember<decltype(Field)>::Type;
-    onLoad.isColor = std::is_same_v<T, OLE_COLOR>;
+    BagDefault saved = onSave.value_or(onLoad);
+    onLoad.isColor = saved.isColor = std::is_same_v<T, OLE_COLOR>;
     return {name,
             onLoad,
-            onSave.value_or(onLoad),
+            saved,
             true,
             [](Control& control, const Variant& value) { (detail::Of<C>(control).*Own).*Field = FromVariant<T>(value); },
             [](const Control& control) -> Variant { return ToVariant((detail::Of<C>(control).*Own).*Field); }};
@@ -111,10 +112,11 @@ template <auto Child, auto Get, auto Set>
 constexpr BagKey childKey(std::string_view name, BagDefault onLoad, std::optional<BagDefault> onSave = {}) {
     using C = typename detail::DataMember<decltype(Child)>::Class;
     using T = std::remove_cvref_t<typename detail::MemberFunction<decltype(Get)>::Result>;
-    onLoad.isColor = std::is_same_v<T, OLE_COLOR>;
+    BagDefault saved = onSave.value_or(onLoad);
+    onLoad.isColor = saved.isColor = std::is_same_v<T, OLE_COLOR>;
     return {name,
             onLoad,
-            onSave.value_or(onLoad),
+            saved,
             false,
             [](Control& control, const Variant& value) { ((detail::Of<C>(control).*Child).*Set)(FromVariant<T>(value)); },
             [](const Control& control) -> Variant { return ToVariant(((detail::Of<C>(control).*Child).*Get)()); }};

@@ -4,6 +4,7 @@
 #include <cstdint>
 #include <functional>
 #include <map>
+#include <memory>
 #include <span>
 #include <string_view>
 #include <utility>
@@ -119,12 +120,13 @@ class Handlers final : public EventSink {
     /// Adds or replaces the handler of an event.
     template <class... Args, class F>
     void On(const Event<Args...>& event, F handler) {
-        handlers_[event.number] = [handler = std::move(handler)](EventArguments arguments) mutable {
+        auto call = [handler = std::move(handler)](EventArguments arguments) mutable {
             [&]<std::size_t... I>(std::index_sequence<I...>) {
                 handler(arguments[I].template As<std::remove_reference_t<Args>>()...);
             }
             (std::index_sequence_for<Args...>{});
         };
+        handlers_[event.number] = std::make_shared<Handler>(std::move(call));
     }
     void Remove(const EventInfo& event) { handlers_.erase(event.number); }
 
@@ -133,11 +135,12 @@ class Handlers final : public EventSink {
         const auto found = handlers_.find(event.number);
         if (found == handlers_.end()) return;
         const auto handler = found->second;  // a handler may replace or remove itself
-        handler(arguments);
+        (*handler)(arguments);
     }
 
   private:
-    std::map<int, std::function<void(EventArguments)>> handlers_;
+    using Handler = std::function<void(EventArguments)>;
+    std::map<int, std::shared_ptr<Handler>> handlers_;
 };
 
 /// Where a child's event goes: one function of its control. Empty until it is connected.

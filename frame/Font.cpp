@@ -13,6 +13,7 @@ void Font::Store(T& field, const T& value) {
     if (field == value) return;
     field = value;
     const auto holders = holders_;  // a holder may let go, or others may come, while it is told
+    const FontRef alive = holders.empty() ? nullptr : holders.front()->font_;
     for (FontHolder* holder : holders)
         if (std::find(holders_.begin(), holders_.end(), holder) != holders_.end() && holder->changed_) holder->changed_();
 }
@@ -21,8 +22,9 @@ void Font::SetName(const std::string& value) { Store(name_, value); }
 
 void Font::SetSize(double value) {
     constexpr double largest = 2048, decimals = 10'000;
-    if (!(value > 0 && value <= largest)) throw ControlError(errors::invalidValue);
-    Store(size_, std::nearbyint(value * decimals) / decimals);
+    const double kept = std::nearbyint(value * decimals) / decimals;
+    if (!(kept > 0 && value <= largest)) throw ControlError(errors::invalidValue);
+    Store(size_, kept);
 }
 
 void Font::SetBold(bool value) { Store(weight_, value ? boldWeight : normalWeight); }

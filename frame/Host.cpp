@@ -14,52 +14,45 @@ Host::Host(const Services& services) : services_(services) {
            services.application && services.files && services.shell && services.clipboard && services.peers && services.errors);
 }
 
-Host::~Host() { retired_.clear(); }
+Host::~Host() { FreeRetired(); }
 
 void Host::Turn() {
-    Flush();
-    const Callout callout(*this);
+    const LoopCall call(*this);
     services_.loop->Turn();
 }
 
 int Host::MsgBox(const std::string& text, int style, const std::string& title) {
-    Flush();
-    const Callout callout(*this);
+    const LoopCall call(*this);
     return services_.dialogs->MsgBox(text, style, title);
 }
 
 void Host::ShowOpen(const std::string& title, const std::string& filter, std::string& fileName) {
-    Flush();
-    const Callout callout(*this);
+    const LoopCall call(*this);
     services_.dialogs->ShowOpen(title, filter, fileName);
 }
 
 void Host::ShowModal(Object& form) {
-    Flush();
-    const Callout callout(*this);
+    const LoopCall call(*this);
     services_.dialogs->ShowModal(form);
 }
 
 void Host::Popup(Object& menu, Object* defaultEntry) {
-    Flush();
-    const Callout callout(*this);
+    const LoopCall call(*this);
     services_.menus->Popup(menu, defaultEntry);
 }
 
 void Host::StartDrag(ChildControl& source) {
-    Flush();
-    const Callout callout(*this);
+    const LoopCall call(*this);
     services_.drag->Start(source);
 }
 
 int Host::Execute(std::string_view verb, const std::string& target) {
-    const Callout callout(*this);
+    const LoopCall call(*this);
     return services_.shell->Execute(verb, target);
 }
 
 FileOperationResult Host::Run(const FileOperation& operation) {
-    Flush();
-    const Callout callout(*this);
+    const LoopCall call(*this);
     return services_.shell->Run(operation);
 }
 
@@ -74,16 +67,28 @@ void Host::Flush() {
     } const running(flushing_);
     const Callout callout(*this);
     while (!touched_.empty()) {
-        ChildControl* child = touched_.back();
-        touched_.pop_back();
+        ChildControl* child = touched_.front();
+        touched_.pop_front();
         child->touched_ = false;
-        if (child->peer_) child->peer_->Update();
+        if (!child->peer_) continue;
+        try {
+            child->peer_->Update();
+        } catch (const ControlError& error) {
+            Unhandled(error, child->Path() + ".Update");
+        } catch (const std::exception& error) {
+            Unhandled(ControlError(errors::internal, error.what()), child->Path() + ".Update");
+        }
     }
+}
+
+void Host::Settle() {
+    Flush();
+    if (depth_ == 0) FreeRetired();
 }
 
 void Host::Touch(ChildControl& child) {
     touched_.push_back(&child);
-    if (depth_ == 0) services_.loop->WantTurn();
+    if (entries_ == 0) services_.loop->WantTurn();
 }
 
 void Host::Forget(ChildControl& child) { std::erase(touched_, &child); }
@@ -91,11 +96,13 @@ void Host::Forget(ChildControl& child) { std::erase(touched_, &child); }
 void Host::Retire(std::unique_ptr<Site> site) {
     site->Detach();
     retired_.push_back(std::move(site));
-    if (depth_ == 0) retired_.clear();
+    if (depth_ == 0)
+        FreeRetired();
+    else
+        services_.loop->WantTurn();
 }
 
-void Host::LeaveOutermost() {
-    Flush();
+void Host::FreeRetired() {
     while (!retired_.empty()) {
         const auto leaving = std::move(retired_);
         retired_.clear();

@@ -15,7 +15,8 @@ void Site::SetPlace(float left, float top) {
     if (left == left_ && top == top_) return;
     left_ = left;
     top_ = top;
-    Moved();
+    const Callout callout(host_);
+    Placed();
 }
 
 void Site::SetSize(float width, float height) {
@@ -24,7 +25,8 @@ void Site::SetSize(float width, float height) {
     if (width == width_ && height == height_) return;
     width_ = width;
     height_ = height;
-    Moved();
+    const Callout callout(host_);
+    Sized();
     if (control_) control_->Resize();
 }
 
@@ -43,9 +45,11 @@ void Site::Start(const PropertyBag* saved, std::optional<float> width, std::opti
         control_->ReadProperties(*saved);
     else
         control_->InitProperties();
-    const float before[] = {width_, height_};
-    SetSize(width.value_or(width_), height.value_or(height_));
-    if (before[0] == width_ && before[1] == height_) control_->Resize();
+    const auto extent = [](float given) { return given > 0 ? given : 0; };
+    width_ = extent(width.value_or(width_));
+    height_ = extent(height.value_or(height_));
+    Sized();
+    control_->Resize();
 }
 
 void Site::Show() { control_->Show(); }

@@ -83,8 +83,11 @@ class Site {
     void Detach();
 
   protected:
-    /// The size or place has been set.
-    virtual void Moved() {}
+    /// The place has been set.
+    virtual void Placed() {}
+    /// The size has been set; `Start` says so once in any case. The design's size, which a control has from `Adopt` to `Start`,
+    /// is not announced.
+    virtual void Sized() {}
 
   private:
     frame::Host& host_;

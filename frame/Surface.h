@@ -108,11 +108,13 @@ class DrawingSurface {
     /// How this surface's units become pixels at scale 1.
     Scale PixelScale() const;
 
+    /// How many twips a unit of the present scale has.
+    TextSize TwipsPerUnit() const;
+
     Host& SurfaceHost() const { return host_; }
 
   private:
     void Emit(const DrawOp& op);
-    TextSize TwipsPerUnit() const;
 
     Host& host_;
     std::vector<Canvas*> canvases_;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <deque>
 #include <functional>
 #include <memory>
 #include <optional>
@@ -9,6 +10,7 @@
 #include <string_view>
 #include <typeindex>
 #include <unordered_map>
+#include <utility>
 #include <vector>
 
 #include "frame/Color.h"
@@ -35,7 +37,8 @@ class MessageLoop {
     virtual ~MessageLoop() = default;
     /// Delivers the timers and the input that are due, paints at most once a frame, and returns.
     virtual void Turn() = 0;
-    /// A child has changed while no call from outside was running: a turn should come soon, so that the screen follows.
+    /// Something changed, or was retired, that no running call from outside will see to: `Host::Settle` should run soon.
+    /// May come often; one turn answers them all.
     virtual void WantTurn() {}
 };
 
@@ -213,6 +216,7 @@ class PeerFactory {
 class ErrorSink {
   public:
     virtual ~ErrorSink() = default;
+    /// Must not throw: it is called where nobody could catch.
     /// `where` names the object and the event, as "Link1.Label1.MouseDown".
     virtual void Unhandled(const ControlError& error, const std::string& where) = 0;
 };
@@ -284,6 +288,10 @@ class Host {
     /// Tells the peers of all changed children. Runs by itself before each question to a peer, at each turn, and when the
     /// outermost call from outside has ended.
     void Flush();
+    /// What a host does at a turn of its message loop: flushes, and frees what was retired if nothing is running.
+    void Settle();
+    /// Whether a call into or out of any control of this host is running: the host must not be destroyed meanwhile.
+    bool Busy() const { return depth_ != 0; }
     void Touch(ChildControl& child);
     void Forget(ChildControl& child);
 
@@ -294,8 +302,9 @@ class Host {
   private:
     friend class Entry;
     friend class Callout;
+    friend class LoopCall;
 
-    void LeaveOutermost();
+    void FreeRetired();
 
     struct ModuleBase {
         virtual ~ModuleBase() = default;
@@ -305,9 +314,10 @@ class Host {
 
     Services services_;
     std::unordered_map<std::type_index, std::unique_ptr<ModuleBase>> modules_;
-    std::vector<ChildControl*> touched_;
+    std::deque<ChildControl*> touched_;
     std::vector<std::unique_ptr<Site>> retired_;
-    int depth_ = 0;  // entries and callouts that are running
+    int depth_ = 0;    // entries and callouts that are running
+    int entries_ = 0;  // entries since the innermost loop that a service runs: the end of the last one flushes
     bool flushing_ = false;
 };
 
@@ -321,6 +331,20 @@ class Callout {
 
   private:
     Host& host_;
+};
+
+/// A callout that may run the message loop: calls from outside that come in meanwhile are outermost ones.
+class LoopCall {
+  public:
+    explicit LoopCall(Host& host) : callout_(host), host_(host), entries_(std::exchange(host.entries_, 0)) { host_.Flush(); }
+    LoopCall(const LoopCall&) = delete;
+    LoopCall& operator=(const LoopCall&) = delete;
+    ~LoopCall() { host_.entries_ = entries_; }
+
+  private:
+    Callout callout_;
+    Host& host_;
+    int entries_;
 };
 
 /// The one way in for every call from outside that is no direct C++ call: input of a peer, a timer's tick, a menu entry, a
@@ -340,6 +364,8 @@ class Entry {
             host.Unhandled(ControlError(errors::outOfMemory), where());
         } catch (const std::exception& error) {
             host.Unhandled(ControlError(errors::internal, error.what()), where());
+        } catch (...) {
+            host.Unhandled(ControlError(errors::internal), where());
         }
     }
 
@@ -347,9 +373,14 @@ class Entry {
     Entry& operator=(const Entry&) = delete;
 
   private:
-    explicit Entry(Host& host) : host_(host) { ++host_.depth_; }
+    explicit Entry(Host& host) : host_(host) {
+        ++host_.depth_;
+        ++host_.entries_;
+    }
     ~Entry() {
-        if (--host_.depth_ == 0) host_.LeaveOutermost();
+        if (host_.entries_ == 1) host_.Flush();
+        --host_.entries_;
+        if (--host_.depth_ == 0) host_.FreeRetired();
     }
 
     Host& host_;

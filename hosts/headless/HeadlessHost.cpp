@@ -217,7 +217,7 @@ frame::Control& HeadlessHost::Create(const frame::ControlClass& controlClass, co
         Form().Add(site.Control());
         site.Start(placing.saved, placing.width, placing.height);
         if (placing.show) site.SetVisible(true);
-    } catch (const frame::ControlError&) {
+    } catch (...) {
         Destroy(site.Control());
         throw;
     }

@@ -94,14 +94,8 @@ Variant SurfaceObject::Call(frame::MemberKey key, frame::Arguments arguments) {
 
 bool SurfaceObject::Has(frame::MemberKey key) const { return drawingTable.Find(key) || HostObject::Has(key); }
 
-void SurfaceObject::SetScaleWidth(float value) {
-    const float present = ScaleWidth();
-    inner_.width = value * (present != 0 ? inner_.width / present : 1);
-}
+void SurfaceObject::SetScaleWidth(float value) { inner_.width = value * TwipsPerUnit().width; }
 
-void SurfaceObject::SetScaleHeight(float value) {
-    const float present = ScaleHeight();
-    inner_.height = value * (present != 0 ? inner_.height / present : 1);
-}
+void SurfaceObject::SetScaleHeight(float value) { inner_.height = value * TwipsPerUnit().height; }
 
 }  // namespace tessel::headless
