@@ -14,7 +14,7 @@
 
 #include "frame/Text.h"
 #include "frame/child/ListView.h"
-#include "tests/frame/TestHost.h"
+#include "hosts/headless/HeadlessHost.h"
 
 /// What a row of a large listing costs: the list, the events around each row, and a peer that follows.
 
@@ -201,12 +201,12 @@ void ReportRows(benchmark::State& state, std::size_t bytes) {
 
 /// A lister whose application listens to the events or not.
 struct Application {
-    Application() : site(host, "FileView1"), lister(site.Make<Lister>()) {}
+    Application() : lister(host.Create<Lister>("FileView1", {.logEvents = false})) {}
 
     void ListenToBoth() {
-        handlers.On(BeforeAddItem, [](bool& cancel, std::string& fileName) { cancel = fileName.empty(); });
-        handlers.On(AfterAddItem, [this](std::int32_t& index) { lastIndex = index; });
-        site.Listen(&handlers);
+        host.SiteOf(lister)->ApplicationHandlers().On(BeforeAddItem,
+                                                      [](bool& cancel, std::string& fileName) { cancel = fileName.empty(); });
+        host.SiteOf(lister)->ApplicationHandlers().On(AfterAddItem, [this](std::int32_t& index) { lastIndex = index; });
     }
     /// Lists again and again; every `turn` rows the peers look, where it is not 0.
     void Run(benchmark::State& state, int turn = 0) {
@@ -214,12 +214,12 @@ struct Application {
         for (auto _ : state) {
             state.PauseTiming();
             lister.Clear();
-            host.Flush();
+            host.Frame().Flush();
             const std::size_t before = liveBytes;
             state.ResumeTiming();
             for (int row = 0; row < rowCount; ++row) {
                 lister.AddItem(row);
-                if (turn > 0 && row % turn == turn - 1) host.Flush();
+                if (turn > 0 && row % turn == turn - 1) host.Frame().Flush();
             }
             bytes = bytes > 0 ? bytes : liveBytes - before;  // the first listing: later ones find room that is there already
         }
@@ -227,10 +227,8 @@ struct Application {
         ReportRows(state, bytes);
     }
 
-    test::TestHost host;
-    frame::Handlers handlers;
+    headless::HeadlessHost host;
     std::int32_t lastIndex = 0;
-    test::TestSite site;
     Lister& lister;
 };
 

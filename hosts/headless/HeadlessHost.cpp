@@ -65,17 +65,23 @@ class HeadlessSite::ExtenderObject final : public HostObject {
 class HeadlessSite::LoggingSink final : public frame::EventSink {
   public:
     explicit LoggingSink(HeadlessSite& site) : site_(site) {}
-    bool Wants(const frame::EventInfo&) const override { return true; }
+    bool Wants(const frame::EventInfo& event) const override {
+        return site_.logEvents_ || site_.onEvent_ || site_.handlers_.Wants(event);
+    }
     void Raise(const frame::EventInfo& event, frame::EventArguments arguments) override {
-        std::vector<Variant> values;
-        values.reserve(arguments.size());
-        for (const frame::EventArgument& argument : arguments) values.push_back(argument.Get());
-        site_.headless_.log.Add({"event", site_.name_, event.name, ListOf(std::move(values))});
+        if (site_.logEvents_) Write(event, arguments);
         if (site_.onEvent_) site_.onEvent_(site_.name_, event, arguments);
         if (site_.handlers_.Wants(event)) site_.handlers_.Raise(event, arguments);
     }
 
   private:
+    void Write(const frame::EventInfo& event, frame::EventArguments arguments) {
+        std::vector<Variant> values;
+        values.reserve(arguments.size());
+        for (const frame::EventArgument& argument : arguments) values.push_back(argument.Get());
+        site_.headless_.log.Add({"event", site_.name_, event.name, ListOf(std::move(values))});
+    }
+
     HeadlessSite& site_;
 };
 
@@ -84,6 +90,7 @@ HeadlessSite::HeadlessSite(HeadlessHost& host, std::string name, const Placing& 
       headless_(host),
       form_(host.Form()),
       name_(std::move(name)),
+      logEvents_(placing.logEvents),
       onEvent_(placing.onEvent),
       sink_(std::make_unique<LoggingSink>(*this)) {
     ambient_.userMode = !placing.designTime;
@@ -164,20 +171,22 @@ class HeadlessHost::LoggingCanvas final : public frame::Canvas {
     frame::Object& owner_;
 };
 
-/// No child is shown; every surface is logged.
-class HeadlessHost::Canvases final : public frame::PeerFactory {
+/// Children are shown where a program asks for it; every surface is logged.
+class HeadlessHost::Peers final : public frame::PeerFactory {
   public:
-    explicit Canvases(Log& log) : log_(log) {}
-    std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl&) override { return nullptr; }
+    explicit Peers(HeadlessHost& host) : host_(host) {}
+    std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl& child) override {
+        return host_.makePeer ? host_.makePeer(child) : nullptr;
+    }
     std::unique_ptr<frame::Canvas> MakeCanvas(frame::DrawingSurface&, frame::Object& owner) override {
-        return std::make_unique<LoggingCanvas>(log_, owner);
+        return std::make_unique<LoggingCanvas>(host_.log, owner);
     }
 
   private:
-    Log& log_;
+    HeadlessHost& host_;
 };
 
-HeadlessHost::HeadlessHost() : canvases_(std::make_unique<Canvases>(log)) {
+HeadlessHost::HeadlessHost() : peers_(std::make_unique<Peers>(*this)) {
     host_ = std::make_unique<frame::Host>(frame::Services{.loop = &loop,
                                                           .dialogs = &dialogs,
                                                           .menus = &menus,
@@ -194,7 +203,7 @@ HeadlessHost::HeadlessHost() : canvases_(std::make_unique<Canvases>(log)) {
                                                           .files = &files,
                                                           .shell = &shell,
                                                           .clipboard = &clipboard,
-                                                          .peers = canvases_.get(),
+                                                          .peers = peers_.get(),
                                                           .errors = &errors});
     NewForm("Form1");
 }

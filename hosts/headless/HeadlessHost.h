@@ -26,6 +26,7 @@ struct Placing {
     frame::FontRef ambientFont = {};
     std::string displayName = {};  ///< the name where there is none
     bool show = true;
+    bool logEvents = true;
     /// Called for each event, with the control's name, before the application's handlers: a script's.
     std::function<void(const std::string&, const frame::EventInfo&, frame::EventArguments)> onEvent = {};
 };
@@ -72,6 +73,7 @@ class HeadlessSite final : public frame::Site {
     HeadlessHost& headless_;
     HeadlessForm& form_;
     std::string name_;
+    bool logEvents_;
     decltype(Placing::onEvent) onEvent_;
     AmbientState ambient_;
     frame::Handlers handlers_;
@@ -142,17 +144,20 @@ class HeadlessHost {
     NoDisk files;
     ErrorList errors;
 
+    /// Shows the children of what is created from now on; nothing is shown without it.
+    std::function<std::unique_ptr<frame::Peer>(frame::ChildControl&)> makePeer;
+
   private:
     friend class HeadlessSite;
     class LoggingCanvas;
-    class Canvases;
+    class Peers;
 
     template <class C>
     static std::unique_ptr<frame::Control> Make(frame::Host& host) {
         return std::make_unique<C>(host);
     }
 
-    std::unique_ptr<Canvases> canvases_;
+    std::unique_ptr<Peers> peers_;
     std::unique_ptr<frame::Host> host_;
     std::vector<std::unique_ptr<HeadlessForm>> forms_;
     std::vector<std::unique_ptr<HeadlessSite>> sites_;

@@ -16,7 +16,7 @@
 
 #include "frame/ResumeNext.h"
 #include "frame/Text.h"
-#include "tests/frame/TestHost.h"
+#include "hosts/headless/HeadlessHost.h"
 
 namespace tessel::child {
 namespace {
@@ -121,7 +121,7 @@ class Screen final : public frame::Peer {
 
 class ListViewTest : public testing::Test {
   protected:
-    ListViewTest() : owner(&site.Make<ListOwner>()) {}
+    ListViewTest() : owner(&host.Create<ListOwner>("FileView1")) {}
 
     ListView& List() { return owner->list; }
     ListRows& Rows() { return List().Rows(); }
@@ -147,7 +147,7 @@ class ListViewTest : public testing::Test {
         auto screen = std::make_unique<Screen>(List());
         Screen& shown = *screen;
         List().AttachPeer(std::move(screen));
-        host.Flush();
+        host.Frame().Flush();
         shown.seen.clear();
         return shown;
     }
@@ -162,9 +162,8 @@ class ListViewTest : public testing::Test {
         return 0;
     }
 
-    test::TestHost host;
+    headless::HeadlessHost host;
     Records records;
-    test::TestSite site{host, "FileView1"};
     ListOwner* owner;
 };
 
@@ -219,13 +218,10 @@ TEST_F(ListItemsTest, ClearEndsEveryRow) {
 }
 
 TEST_F(ListItemsTest, AnItemOutlivesItsListAndThenFailsWithError91) {
-    ListItemRef item;
-    {
-        test::TestSite other(host, "FileView2");
-        ListOwner& otherOwner = other.Make<ListOwner>();
-        otherOwner.list.ListItems.Add("a");
-        item = otherOwner.list.ListItems.Item(1);
-    }
+    ListOwner& other = host.Create<ListOwner>("FileView2");
+    other.list.ListItems.Add("a");
+    const ListItemRef item = other.list.ListItems.Item(1);
+    host.Destroy(other);
     EXPECT_EQ(ErrorOf([&] { item->Text(); }), errors::objectGone);
 }
 
@@ -350,8 +346,7 @@ TEST_F(ListViewTest, SelectedItemIsNothingOnceItsRowHasGone) {
 }
 
 TEST_F(ListViewTest, SelectedItemTakesNothingButRowsOfItsOwn) {
-    test::TestSite other(host, "FileView2");
-    ListView& otherList = other.Make<ListOwner>().list;
+    ListView& otherList = host.Create<ListOwner>("FileView2").list;
     otherList.ListItems.Add("x");
     Add({"a", "b"});
     const ListItemRef gone = Item(2);
@@ -377,7 +372,9 @@ TEST_F(ListViewTest, AClickedRowIsTheOnlyOneSelectedBeforeTheEvent) {
 TEST_F(ListViewTest, AClickBesideTheRowsIsReportedAndChangesNothing) {
     Add({"a"});
     List().ItemClickInput(2);
-    EXPECT_THAT(host.Errors(), ElementsAre(test::KeptErrors::Kept{errors::indexOutOfBounds, "FileView1.ListFiles.ItemClick"}));
+    ASSERT_EQ(host.errors.reports.size(), 1u);
+    EXPECT_EQ(host.errors.reports[0].error.Number(), errors::indexOutOfBounds);
+    EXPECT_EQ(host.errors.reports[0].where, "FileView1.ListFiles.ItemClick");
     EXPECT_EQ(owner->heard, "");
     EXPECT_EQ(Texts(), "a");
 }
@@ -691,7 +688,7 @@ TEST_F(ListSortTest, SettlesAsAStableSortOfAllRowsDoes) {
         plain.Settle();
         names.clear();
         for (const auto& row : plain.rows) names.push_back(row.name);
-        host.Flush();
+        host.Frame().Flush();
         ASSERT_EQ(screen.texts, names) << "step " << step;
     }
 }
@@ -704,13 +701,13 @@ TEST_F(ListPeerTest, APeerBeginsWithTheWholeList) {
 TEST_F(ListPeerTest, AThousandAddsAreOneUpdateWithOneStep) {
     const Screen& screen = Show();
     Rows().SetSource(&records);
-    host.Flush();
+    host.Frame().Flush();
     const std::size_t before = screen.seen.size();
     for (int row = 0; row < 1'000; ++row) {
         const RowId id = Capture(frame::Decimal(row));
         Rows().SetGhosted(id, true);
     }
-    host.Flush();
+    host.Frame().Flush();
     ASSERT_THAT(screen.seen, SizeIs(before + 1));
     EXPECT_THAT(screen.seen.back(), ElementsAre(RowChange{RowChange::Kind::Inserted, 0, 1'000}));
     EXPECT_EQ(screen.texts.back(), "999");
@@ -720,9 +717,9 @@ TEST_F(ListPeerTest, ARowSettlesBeforeItIsShown) {
     const Screen& screen = Show();
     List().SetSorted(true);
     Add({"a", "b", "c", "d", "e", "f", "g", "h", "i", "j"});
-    host.Flush();
+    host.Frame().Flush();
     Item(2)->SetText("m");
-    host.Flush();
+    host.Frame().Flush();
     EXPECT_EQ(screen.texts.back(), "m");
     EXPECT_EQ(Texts(), "a c d e f g h i j m");
     EXPECT_THAT(screen.seen.back(), SizeIs(3));  // the row has changed, left and come back
