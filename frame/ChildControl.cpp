@@ -17,6 +17,8 @@ ChildControl::~ChildControl() {
 
 std::string ChildControl::Path() const { return owner_.Path() + "." + name_; }
 
+bool ChildControl::IsAttached() const { return owner_.Site() != nullptr; }
+
 void ChildControl::Move(float left, float top, float width, float height) {
     const float before[] = {left_, top_, width_, height_};
     Place(left, top, width, height);

@@ -72,18 +72,24 @@ class ChildControl : public Object {
     /// Runs what a peer reports, through the one way in.
     template <class F>
     void Enter(std::string_view event, F&& call) {
+        if (!IsAttached()) return;
         Entry::Run(
             host_, [&] { return Path() + "." + std::string(event); }, call);
     }
 
   private:
     friend class frame::Host;
+    friend class Control;
+
+    /// Whether the host has not let go of the child's control.
+    bool IsAttached() const;
 
     Control& owner_;
     frame::Host& host_;
     std::string name_;
     float left_ = 0, top_ = 0, width_ = 0, height_ = 0;
     bool visible_ = true, enabled_ = true;
+    bool askedForPeer_ = false;
     bool touched_ = false;  // stands in the host's list of changed children
     std::string toolTipText_;
     std::unique_ptr<frame::Peer> peer_;

@@ -34,7 +34,7 @@ constexpr int Red(OLE_COLOR rgb) { return static_cast<int>(rgb.value & 0xFF); }
 constexpr int Green(OLE_COLOR rgb) { return static_cast<int>(rgb.value >> 8 & 0xFF); }
 constexpr int Blue(OLE_COLOR rgb) { return static_cast<int>(rgb.value >> 16 & 0xFF); }
 
-/// The colours that stand behind 0x80000000 to 0x80000018 on a screen; a host gives its own, `classic` is the fixed set.
+/// The colours that stand behind 0x80000000 to 0x80000018 on a screen; a host gives its own, `ClassicColors` is a fixed set.
 class SystemColors {
   public:
     virtual ~SystemColors() = default;

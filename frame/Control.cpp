@@ -1,6 +1,8 @@
 #include "frame/Control.h"
 
 #include <algorithm>
+#include <cassert>
+#include <utility>
 
 #include "frame/Text.h"
 
@@ -30,8 +32,11 @@ void Control::WriteProperties(PropertyBag& bag) const {
         for (const BagKey& key : table.bag) write(key);
         return;
     }
-    for (const std::string_view name : table.savedOrder)
-        write(*std::find_if(table.bag.begin(), table.bag.end(), [&](const BagKey& key) { return key.name == name; }));
+    for (const std::string_view name : table.savedOrder) {
+        const auto found = std::find_if(table.bag.begin(), table.bag.end(), [&](const BagKey& key) { return key.name == name; });
+        assert(found != table.bag.end());
+        write(*found);
+    }
 }
 
 FontRef Control::AmbientFont() const { return site_ ? site_->Ambient().Font() : std::make_shared<Font>(); }
@@ -57,8 +62,8 @@ Object& Control::Extender() const {
 }
 
 void Control::TakePeers() {
-    for (ChildControl* child : children_) child->AttachPeer(host_.Peers().MakePeer(*child));
-    surface_.AddCanvas(host_.Peers().MakeCanvas(surface_, *this));
+    for (ChildControl* child : children_)
+        if (!std::exchange(child->askedForPeer_, true)) child->AttachPeer(host_.Peers().MakePeer(*child));
 }
 
 void Control::DropPeers() {

@@ -94,6 +94,7 @@ class Control : public Object {
 
     void AddChild(ChildControl& child) { children_.push_back(&child); }
     void RemoveChild(ChildControl& child) { std::erase(children_, &child); }
+    /// Asks the host for the peers of the children that have not yet been asked for.
     void TakePeers();
     /// Before the children go: a peer may still look at its child.
     void DropPeers();

@@ -115,12 +115,13 @@ struct Conversion<T&> {
     static constexpr VarType type = VarType::Object;
     static Variant To(T& value) { return ObjectRef(value); }
 };
-/// An optional argument of a fixed type.
+/// An optional argument: an `std::optional<Variant>` is nothing when it is missing, any other type also for null.
 template <class T>
 struct Conversion<std::optional<T>> {
     static constexpr VarType type = Conversion<T>::type;
     static std::optional<T> From(const Variant& value) {
-        return value.IsMissing() ? std::nullopt : std::optional<T>(Conversion<T>::From(value));
+        const bool none = value.IsMissing() || (value.IsEmpty() && !std::is_same_v<T, Variant>);
+        return none ? std::nullopt : std::optional<T>(Conversion<T>::From(value));
     }
 };
 

@@ -36,7 +36,7 @@ struct DriveRecord {
     bool isReady = true;
 };
 
-/// A file opened for binary reading or writing. Positions and sizes are in bytes; every failure is a `Status`.
+/// A file opened for binary reading. Positions and sizes are in bytes; a failed read is a `Status`.
 class BinaryFile {
   public:
     virtual ~BinaryFile() = default;

@@ -104,7 +104,7 @@ template <class R, class C, class... A>
 struct MemberFunction<R (C::*)(A...) const noexcept> : MemberFunction<R (C::*)(A...)> {};
 
 template <class T>
-inline constexpr bool isOptional = std::is_same_v<T, Variant>;
+inline constexpr bool isOptional = false;
 template <class T>
 inline constexpr bool isOptional<std::optional<T>> = true;
 

@@ -36,8 +36,10 @@ void Site::Adopt(std::unique_ptr<frame::Control> control) {
     const auto size = control_->DesignSize();
     width_ = size.width;
     height_ = size.height;
+    control_->Surface().AddCanvas(host_.Peers().MakeCanvas(control_->Surface(), *control_));
     control_->TakePeers();
     control_->Initialize();
+    control_->TakePeers();  // of the children that it has made
 }
 
 void Site::Start(const PropertyBag* saved, std::optional<float> width, std::optional<float> height) {

@@ -15,6 +15,8 @@ void CheckRange(int value, int least, int greatest) {
 
 }  // namespace
 
+DrawingSurface::DrawingSurface(Host& host) : host_(host) { font_.Set(std::make_shared<frame::Font>()); }
+
 void DrawingSurface::Cls() {
     Emit(draw::Cls{});
     currentX_ = scaleLeft_;
@@ -71,13 +73,11 @@ void DrawingSurface::PaintPicture(const PictureRef& picture, float x, float y) {
 }
 
 float DrawingSurface::TextWidth(const std::string& text) const {
-    const frame::Font font;
-    return host_.Metrics().Measure(Font() ? *Font() : font, text).width / TwipsPerUnit().width;
+    return host_.Metrics().Measure(*Font(), text).width / TwipsPerUnit().width;
 }
 
 float DrawingSurface::TextHeight(const std::string& text) const {
-    const frame::Font font;
-    return host_.Metrics().Measure(Font() ? *Font() : font, text).height / TwipsPerUnit().height;
+    return host_.Metrics().Measure(*Font(), text).height / TwipsPerUnit().height;
 }
 
 void DrawingSurface::SetDrawWidth(std::int16_t value) {
@@ -167,7 +167,7 @@ void DrawingSurface::SetForeColor(OLE_COLOR value) {
 }
 
 void DrawingSurface::SetFont(const FontRef& value) {
-    font_.Set(value);
+    font_.Set(value ? value : std::make_shared<frame::Font>());
     LookChanged();
 }
 

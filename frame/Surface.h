@@ -32,7 +32,7 @@ inline constexpr float twipsPerPixel = 15;
 /// go to every canvas that the host has added, and leave `CurrentX` and `CurrentY` where they end.
 class DrawingSurface {
   public:
-    explicit DrawingSurface(Host& host) : host_(host) {}
+    explicit DrawingSurface(Host& host);
     virtual ~DrawingSurface() = default;
 
     // Operations.
@@ -87,10 +87,11 @@ class DrawingSurface {
     void SetBackColor(OLE_COLOR value);
     OLE_COLOR ForeColor() const { return foreColor_; }
     void SetForeColor(OLE_COLOR value);
+    /// Never null: a set to null gives a font of the default name and size.
     const FontRef& Font() const { return font_.Get(); }
     void SetFont(const FontRef& value);
 
-    /// A canvas that gets every operation from now on. It must outlive the surface, or be removed.
+    /// A canvas that gets every operation from now on. It must be there for as long as something is drawn.
     void AddCanvas(Canvas& canvas) { canvases_.push_back(&canvas); }
     void RemoveCanvas(Canvas& canvas) { std::erase(canvases_, &canvas); }
     /// The same for a canvas that lives as long as the surface; null is none.

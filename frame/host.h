@@ -69,10 +69,13 @@ class Menus {
     virtual void Popup(Object& menu, Object* defaultEntry) = 0;
 };
 
-/// Drag and drop, seen from the source. 1 is copy, 2 move.
+/// Drag and drop.
 class DragAndDrop {
   public:
     virtual ~DragAndDrop() = default;
+    /// Starts a drag from a child and returns when it has ended or been given to the system. What the drag carries, what it
+    /// allows, its feedback and its end are asked and told by the inputs of the child, with a `DragData`; so is what is
+    /// dragged over a child and dropped on it.
     virtual void Start(ChildControl& source) = 0;
 };
 
@@ -147,7 +150,8 @@ struct TextSize {
 class TextMetrics {
   public:
     virtual ~TextMetrics() = default;
-    /// The size of a text in twips; lines part at line feeds, and at blanks where `wrapWidth` (in twips) is given.
+    /// The size of a text in twips; lines part at line feeds (a carriage return before one
+    /// counts to it), and at blanks where `wrapWidth` (in twips) is given.
     virtual TextSize Measure(const Font& font, std::string_view text, std::optional<float> wrapWidth = {}) = 0;
 };
 
@@ -177,8 +181,9 @@ struct FileOperationResult {
 class Shell {
   public:
     virtual ~Shell() = default;
-    /// Opens or prints what `target` names with the program that the system has for it. Above 32 for success, else 2 or 3
-    /// (not found), 31 (no program) or another number. `verb` is "open" or "print".
+    /// Opens or prints what `target` names (UTF-8; the host converts it where its shell wants another form) with the program that
+    /// the system has for it. Above 32 for success, else 2 or 3 (not found), 31 (no program) or another number. `verb` is "open" or
+    /// "print".
     virtual int Execute(std::string_view verb, const std::string& target) = 0;
     virtual FileOperationResult Run(const FileOperation& operation) = 0;
 };
@@ -199,8 +204,6 @@ class Peer {
     virtual ~Peer() = default;
     /// The child has changed since the last call. Comes once for any number of changes, from `Host::Flush`.
     virtual void Update() = 0;
-    /// Takes the input focus, or opens what the child is about to ask the user.
-    virtual void SetFocus() {}
 };
 
 class PeerFactory {
@@ -295,8 +298,8 @@ class Host {
     void Touch(ChildControl& child);
     void Forget(ChildControl& child);
 
-    /// Ends a control's life: it is detached at once (it hears and raises nothing more) and freed when no call into or out
-    /// of any control of this host is running.
+    /// Ends a control's life: it is detached at once (it hears no input and raises nothing more; a routine of it that is running
+    /// goes on to its end) and freed when no call into or out of any control of this host is running.
     void Retire(std::unique_ptr<Site> site);
 
   private:

@@ -113,12 +113,12 @@ void Link::Refresh() {
     CopyToolTip();
 }
 
-std::string Link::OpenLink(const Variant& MyLinkTo) {
-    return RunShell(MyLinkTo.IsMissing() ? own.LinkTo : MyLinkTo.ToText(), Verb::Open);
+std::string Link::OpenLink(const std::optional<Variant>& MyLinkTo) {
+    return RunShell(MyLinkTo ? MyLinkTo->ToText() : own.LinkTo, Verb::Open);
 }
 
-std::string Link::PrintLink(const Variant& MyLinkTo) {
-    return RunShell(MyLinkTo.IsMissing() ? own.LinkTo : MyLinkTo.ToText(), Verb::Print);
+std::string Link::PrintLink(const std::optional<Variant>& MyLinkTo) {
+    return RunShell(MyLinkTo ? MyLinkTo->ToText() : own.LinkTo, Verb::Print);
 }
 
 void Link::ReadProperties(const frame::PropertyBag& bag) {

@@ -61,9 +61,9 @@ class Link final : public frame::Control {
     void Refresh();
     /// Opens `MyLinkTo`, or `LinkTo` when it is missing; nothing for an empty target. Gives the empty string, or the message of
     /// the failure, which has also been shown unless `SuppressMessages` is set.
-    std::string OpenLink(const frame::Variant& MyLinkTo = frame::Variant::Missing());
+    std::string OpenLink(const std::optional<frame::Variant>& MyLinkTo = {});
     /// The same for printing.
-    std::string PrintLink(const frame::Variant& MyLinkTo = frame::Variant::Missing());
+    std::string PrintLink(const std::optional<frame::Variant>& MyLinkTo = {});
 
     void ReadProperties(const frame::PropertyBag& bag) override;
     void Resize() override;

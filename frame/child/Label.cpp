@@ -37,6 +37,10 @@ void Label::SetAppearance(AppearanceConstants value) {
     SetForeColor(value == AppearanceConstants::Flat ? frame::colors::windowText : frame::colors::buttonText);
 }
 
+void Label::ChangeInput() {
+    Enter("Change", [&] { Change(); });
+}
+
 void Label::Moved() { FitAndTell(); }
 
 void Label::FontChanged() {
@@ -75,7 +79,8 @@ constexpr auto members =
              frame::property<&Label::BackColor, &Label::SetBackColor>("BackColor", "The colour behind the text."),
              frame::property<&Label::ForeColor, &Label::SetForeColor>("ForeColor", "The colour of the text."),
          });
-constexpr frame::ClassTable table{.name = "Label", .members = members, .inputs = pointerInputs, .defaultMember = "Caption"};
+constexpr auto inputs = frame::Join(pointerInputs, std::array{frame::input<&Label::ChangeInput>("Change")});
+constexpr frame::ClassTable table{.name = "Label", .members = members, .inputs = inputs, .defaultMember = "Caption"};
 
 }  // namespace
 

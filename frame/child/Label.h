@@ -44,6 +44,8 @@ class Label final : public PointerChild {
     frame::OLE_COLOR ForeColor() const { return foreColor_; }
     void SetForeColor(frame::OLE_COLOR value) { Store(foreColor_, value); }
 
+    /// What a toolkit reports when it has changed the label by itself.
+    void ChangeInput();
     /// Comes when the text is another, and when the label has changed its size by itself.
     frame::Slot<> Change;
 

@@ -9,7 +9,6 @@ using frame::twipsPerPixel;
 
 PictureBox::PictureBox(frame::Control& owner, std::string name)
     : KeyChild(owner, std::move(name)), DrawingSurface(owner.Host()), raster_(0, 0, BackColor()) {
-    SetFont(std::make_shared<frame::Font>());
     AddCanvas(raster_);
     AddCanvas(owner.Host().Peers().MakeCanvas(*this, *this));
 }

@@ -9,27 +9,36 @@ namespace tessel::headless {
 
 using frame::Variant;
 
-/// The host's own members of a control. The geometry is the site's; all else is what the host was given.
+/// The host's own members of a control, and behind them the control's: what stands on the form for all who reach the control
+/// by name. The geometry is the site's; all else is what the host was given.
 class HeadlessSite::ExtenderObject final : public HostObject {
   public:
     ExtenderObject(HeadlessSite& site, Members members) : HostObject(site.name_, std::move(members)), site_(site) {}
 
     Variant Get(frame::MemberKey key, frame::Arguments arguments = {}) override {
-        if (const auto* own = Own().Find(key)) return own->get(*this, arguments);
-        return HostObject::Get(key, arguments);
+        if (const auto* own = Find(key)) return own->get(*this, arguments);
+        return HostObject::Has(key) ? HostObject::Get(key, arguments) : site_.Control().Get(key, arguments);
     }
     void Put(frame::MemberKey key, const Variant& value, frame::Arguments arguments = {}) override {
-        if (const auto* own = Own().Find(key)) {
+        if (const auto* own = Find(key)) {
             if (!own->set) throw frame::ControlError(frame::errors::notAtRunTime);
             own->set(*this, arguments, value);
-        } else if (!key.ByNumber() && frame::EqualsNoCase(key.Name(), "ToolTipText"))
+        } else if (IsToolTip(key)) {
             SetMember("ToolTipText", value);
-        else
+        } else if (HostObject::Has(key)) {
             HostObject::Put(key, value, arguments);
+        } else {
+            site_.Control().Put(key, value, arguments);
+        }
+    }
+    Variant Call(frame::MemberKey key, frame::Arguments arguments = {}) override {
+        return Find(key) || HostObject::Has(key) ? Get(key, arguments) : site_.Control().Call(key, arguments);
     }
     bool Has(frame::MemberKey key) const override {
-        return Own().Find(key) || HostObject::Has(key) || (!key.ByNumber() && frame::EqualsNoCase(key.Name(), "ToolTipText"));
+        return Find(key) || IsToolTip(key) || HostObject::Has(key) || site_.Control().Has(key);
     }
+    frame::ObjectRef Inner(std::string_view name) override { return site_.Control().Inner(name); }
+    const frame::ClassTable& Table() const override { return site_.Control().Table(); }
 
     std::string Name() const { return site_.name_; }
     float Left() const { return site_.Left(); }
@@ -44,7 +53,9 @@ class HeadlessSite::ExtenderObject final : public HostObject {
     void SetVisible(bool value) { site_.SetVisible(value); }
 
   private:
-    static const frame::ClassTable& Own() {
+    static bool IsToolTip(frame::MemberKey key) { return !key.ByNumber() && frame::EqualsNoCase(key.Name(), "ToolTipText"); }
+    /// The row of one of the host's own members; they have names alone.
+    static const frame::Member* Find(frame::MemberKey key) {
         using E = ExtenderObject;
         static constexpr std::array rows = {
             frame::property<&E::Name>("Name"),
@@ -55,7 +66,7 @@ class HeadlessSite::ExtenderObject final : public HostObject {
             frame::property<&E::Visible, &E::SetVisible>("Visible"),
         };
         static constexpr frame::ClassTable table{.name = "Extender", .members = rows};
-        return table;
+        return key.ByNumber() ? nullptr : table.Find(key);
     }
 
     HeadlessSite& site_;
@@ -119,6 +130,9 @@ void HeadlessSite::PropertyChanged(std::string_view key) { headless_.log.Add({"c
 
 HeadlessForm::HeadlessForm(HeadlessHost& host, const std::string& name, Members members) : SurfaceObject(host.Frame(), name, {}) {
     SetMember("Name", name);
+    for (const char* place : {"Left", "Top"}) SetMember(place, 0.0f);
+    SetMember("Width", InnerSize().width);
+    SetMember("Height", InnerSize().height);
     SetMember("Picture", frame::ObjectRef());
     SetMember("MouseIcon", frame::ObjectRef());
     SetMember("MousePointer", std::int16_t{0});
@@ -213,19 +227,43 @@ HeadlessHost::~HeadlessHost() {
 }
 
 HeadlessForm& HeadlessHost::NewForm(const std::string& name, HostObject::Members members) {
+    if (HeadlessForm* known = FindForm(name)) {
+        known->Take(std::move(members));
+        form_ = known;
+        return *known;
+    }
     forms_.push_back(std::make_unique<HeadlessForm>(*this, name, std::move(members)));
-    return *forms_.back();
+    form_ = forms_.back().get();
+    return *form_;
+}
+
+HeadlessForm* HeadlessHost::FindForm(std::string_view name) {
+    const auto found =
+        std::find_if(forms_.begin(), forms_.end(), [&](const auto& form) { return frame::EqualsNoCase(form->Path(), name); });
+    return found != forms_.end() ? found->get() : nullptr;
 }
 
 frame::Control& HeadlessHost::Create(const frame::ControlClass& controlClass, const std::string& name, const Placing& placing) {
-    auto made = std::make_unique<HeadlessSite>(*this, name, placing);
+    auto control = controlClass.make(*host_);
+    Placing placed = placing;
+    std::vector<std::pair<std::string, Variant>> place;
+    std::erase_if(placed.extender, [&](const auto& member) {
+        const auto is = [&](std::string_view known) { return frame::EqualsNoCase(member.first, known); };
+        if (is("Left") || is("Top")) place.push_back(member);
+        if (is("Width") && !placed.width) placed.width = member.second.ToSingle();
+        if (is("Height") && !placed.height) placed.height = member.second.ToSingle();
+        if (is("Visible")) placed.show = placed.show && member.second.ToBoolean();
+        return is("Left") || is("Top") || is("Width") || is("Height") || is("Visible") || is("Name");
+    });
+    auto made = std::make_unique<HeadlessSite>(*this, name, placed);
     HeadlessSite& site = *made;
     sites_.push_back(std::move(made));
     try {
-        site.Adopt(controlClass.make(*host_));
-        Form().Add(site.Control());
-        site.Start(placing.saved, placing.width, placing.height);
-        if (placing.show) site.SetVisible(true);
+        site.Adopt(std::move(control));
+        for (const auto& [member, value] : place) site.Extender().Put(member, value);
+        Form().Add(site.Extender());
+        site.Start(placed.saved, placed.width, placed.height);
+        if (placed.show) site.SetVisible(true);
     } catch (...) {
         Destroy(site.Control());
         throw;
@@ -247,7 +285,7 @@ HeadlessSite* HeadlessHost::FindSite(std::string_view name) {
 void HeadlessHost::Destroy(frame::Control& control) {
     const auto found = std::find_if(sites_.begin(), sites_.end(), [&](const auto& site) { return &site->Control() == &control; });
     if (found == sites_.end()) return;
-    TakeOffForms(control);
+    TakeOffForms((*found)->Extender());
     auto site = std::move(*found);
     sites_.erase(found);
     host_->Retire(std::move(site));

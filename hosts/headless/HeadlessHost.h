@@ -31,8 +31,8 @@ struct Placing {
     std::function<void(const std::string&, const frame::EventInfo&, frame::EventArguments)> onEvent = {};
 };
 
-/// The place of a control on the headless host. Its extender has `Name`, `Left`, `Top`, `Width`, `Height`, `Visible`, and what
-/// it was given. `ToolTipText` exists once it has been given or set.
+/// The place of a control on the headless host. Its extender has `Name`, `Left`, `Top`, `Width`, `Height`, `Visible`, what it was
+/// given, and behind them the control's own members. `ToolTipText` exists once it has been given or set.
 class HeadlessSite final : public frame::Site {
   public:
     HeadlessSite(HeadlessHost& host, std::string name, const Placing& placing);
@@ -107,8 +107,11 @@ class HeadlessHost {
     operator frame::Host&() { return *host_; }
 
     /// The form that holds what is created next; "Form1" at first.
-    HeadlessForm& Form() { return *forms_.back(); }
+    HeadlessForm& Form() { return *form_; }
+    /// Makes a form, or takes the one of that name, and sets what is given; it holds what is created next.
     HeadlessForm& NewForm(const std::string& name, HostObject::Members members = {});
+
+    HeadlessForm* FindForm(std::string_view name);
 
     /// Makes, loads and shows a control. An error of its load passes to the caller, and the control is gone.
     frame::Control& Create(const frame::ControlClass& controlClass, const std::string& name, const Placing& placing = {});
@@ -160,6 +163,7 @@ class HeadlessHost {
     std::unique_ptr<Peers> peers_;
     std::unique_ptr<frame::Host> host_;
     std::vector<std::unique_ptr<HeadlessForm>> forms_;
+    HeadlessForm* form_ = nullptr;
     std::vector<std::unique_ptr<HeadlessSite>> sites_;
 };
 

@@ -19,6 +19,10 @@ constexpr frame::ClassTable drawingTable{.name = "Surface", .members = frame::dr
 
 }  // namespace
 
+HostObject::HostObject(std::string path, const Members& members) : path_(std::move(path)) {
+    for (const auto& [name, value] : members) SetMember(name, value);
+}
+
 const frame::ClassTable& HostObject::Table() const { return plainTable; }
 
 const Variant* HostObject::Find(frame::MemberKey key) const {
@@ -49,6 +53,9 @@ frame::ObjectRef HostObject::Inner(std::string_view name) {
 }
 
 void HostObject::SetMember(std::string_view name, Variant value) {
+    constexpr std::string_view color = "Color";
+    if (value.IsNumber() && name.size() >= color.size() && frame::EqualsNoCase(name.substr(name.size() - color.size()), color))
+        value = value.ToColor();
     const auto found =
         std::find_if(members_.begin(), members_.end(), [&](const auto& member) { return frame::EqualsNoCase(member.first, name); });
     if (found != members_.end())
@@ -60,6 +67,13 @@ void HostObject::SetMember(std::string_view name, Variant value) {
 SurfaceObject::SurfaceObject(frame::Host& host, std::string path, Members members)
     : HostObject(std::move(path), {}), DrawingSurface(host) {
     AddCanvas(host.Peers().MakeCanvas(*this, *this));
+    AddCanvas(raster_);
+    frame::TextSize size{12'000, 9'000};
+    for (const auto& [name, value] : members) {
+        if (frame::EqualsNoCase(name, "Width")) size.width = value.ToSingle();
+        if (frame::EqualsNoCase(name, "Height")) size.height = value.ToSingle();
+    }
+    SetInner(size);
     Take(std::move(members));
 }
 
@@ -94,8 +108,26 @@ Variant SurfaceObject::Call(frame::MemberKey key, frame::Arguments arguments) {
 
 bool SurfaceObject::Has(frame::MemberKey key) const { return drawingTable.Find(key) || HostObject::Has(key); }
 
-void SurfaceObject::SetScaleWidth(float value) { inner_.width = value * TwipsPerUnit().width; }
+void SurfaceObject::SetScaleWidth(float value) {
+    if (ScaleMode() == frame::ScaleModeConstants::User)
+        DrawingSurface::SetScaleWidth(value);
+    else
+        SetInner({value * TwipsPerUnit().width, inner_.height});
+}
 
-void SurfaceObject::SetScaleHeight(float value) { inner_.height = value * TwipsPerUnit().height; }
+void SurfaceObject::SetScaleHeight(float value) {
+    if (ScaleMode() == frame::ScaleModeConstants::User)
+        DrawingSurface::SetScaleHeight(value);
+    else
+        SetInner({inner_.width, value * TwipsPerUnit().height});
+}
+
+void SurfaceObject::SetInner(frame::TextSize size) {
+    inner_ = size;
+    raster_.Resize(frame::PixelAt(size.width / frame::twipsPerPixel), frame::PixelAt(size.height / frame::twipsPerPixel),
+                   OleTranslateColor(BackColor(), SurfaceHost().Colors()));
+}
+
+void SurfaceObject::Wiped() { raster_.Draw(frame::draw::Cls{}, {}, {}, OleTranslateColor(BackColor(), SurfaceHost().Colors()), 0); }
 
 }  // namespace tessel::headless

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <memory>
+#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
@@ -8,6 +9,7 @@
 #include "frame/Object.h"
 #include "frame/Surface.h"
 #include "frame/Variant.h"
+#include "frame/child/Raster.h"
 
 namespace tessel::headless {
 
@@ -18,7 +20,7 @@ class HostObject : public frame::Object {
     using Members = std::vector<std::pair<std::string, frame::Variant>>;
 
     /// `path` is the object's place in logs: "Text1", "Text1(2)".
-    HostObject(std::string path, Members members) : path_(std::move(path)), members_(std::move(members)) {}
+    HostObject(std::string path, const Members& members);
 
     frame::Variant Get(frame::MemberKey key, frame::Arguments arguments = {}) override;
     void Put(frame::MemberKey key, const frame::Variant& value, frame::Arguments arguments = {}) override;
@@ -28,7 +30,7 @@ class HostObject : public frame::Object {
     std::string Path() const override { return path_; }
     const frame::ClassTable& Table() const override;
 
-    /// Adds a member, or sets the one of that name.
+    /// Adds a member, or sets the one of that name. A number under a name that ends in "Color" is a colour.
     void SetMember(std::string_view name, frame::Variant value);
 
   protected:
@@ -39,7 +41,8 @@ class HostObject : public frame::Object {
     Members members_;
 };
 
-/// A host's object with a surface: a form, a picture box of the application. It has the drawing members beside its own.
+/// A host's object with a surface: a form, a picture box of the application. It has the drawing members beside its own, and
+/// keeps its pixels. It is as large as its members `Width` and `Height` say when it is made, else 12,000 by 9,000 twips.
 class SurfaceObject : public HostObject, public frame::DrawingSurface {
   public:
     SurfaceObject(frame::Host& host, std::string path, Members members);
@@ -49,17 +52,23 @@ class SurfaceObject : public HostObject, public frame::DrawingSurface {
     frame::Variant Call(frame::MemberKey key, frame::Arguments arguments = {}) override;
     bool Has(frame::MemberKey key) const override;
 
-    // The inner size is set in the units of the present scale and keeps that scale.
+    // The inner size is set in the units of the present scale and keeps that scale, but for a user's own, which is then another.
     void SetScaleWidth(float value) override;
     void SetScaleHeight(float value) override;
 
-  protected:
-    frame::TextSize InnerSize() const override { return inner_; }
     /// Sets what is given, the scale mode last: sizes are given in twips, whatever the mode.
     void Take(Members members);
 
+  protected:
+    frame::TextSize InnerSize() const override { return inner_; }
+    std::optional<frame::OLE_COLOR> PixelOf(int x, int y) const override { return raster_.Pixel(x, y); }
+    void Wiped() override;
+
   private:
-    frame::TextSize inner_{12'000, 9'000};
+    void SetInner(frame::TextSize size);
+
+    frame::TextSize inner_;
+    child::Raster raster_{0, 0, 0};
 };
 
 }  // namespace tessel::headless

@@ -175,7 +175,8 @@ frame::TextSize FixedMetrics::Measure(const frame::Font&, std::string_view text,
     std::vector<std::size_t> lengths;
     for (std::size_t start = 0; start <= text.size();) {
         const std::size_t end = std::min(text.find('\n', start), text.size());
-        const std::string_view line = text.substr(start, end - start);
+        std::string_view line = text.substr(start, end - start);
+        if (!line.empty() && line.back() == '\r') line.remove_suffix(1);
         if (wrapWidth) {
             const float limit = std::min(std::max(1.0f, *wrapWidth / characterWidth), widestLine);
             const auto wrapped = WrappedLengths(line, static_cast<std::size_t>(limit));

@@ -42,7 +42,10 @@ class Thing final : public Object {
     Thing& Self() { return *this; }
 
     std::int32_t Add(std::int16_t a, std::optional<std::int32_t> b) const { return a + b.value_or(100); }
-    std::string Kind(const Variant& value) const { return value.IsMissing() ? "Missing" : std::string(VarTypeName(value.Type())); }
+    std::string Kind(const std::optional<Variant>& value) const {
+        return value ? std::string(VarTypeName(value->Type())) : "Missing";
+    }
+    std::string Needed(const Variant& value) const { return std::string(VarTypeName(value.Type())); }
     void Exchange(std::int16_t& number, std::string& text, std::int32_t factor) {
         number = static_cast<std::int16_t>(number * factor);
         text += "!";
@@ -73,6 +76,7 @@ inline constexpr std::array members = {
     property<&Thing::Face, &Thing::SetFace>("Face"),
     method<&Thing::Add>("Add", "", {"A", "B"}),
     method<&Thing::Kind>("Kind", "", {"Value"}),
+    method<&Thing::Needed>("Needed", "", {"Value"}),
     method<&Thing::Exchange>("Exchange", "", {"Number", "Text", "Factor"}),
     method<&Thing::Spoil>("Spoil", "", {"Number"}),
     method<&Thing::Try>("Try", "", {"Works"}),
@@ -228,11 +232,13 @@ TEST(Object, TakesAnOptionalArgumentThatIsLeftOffOrMarkedMissing) {
     EXPECT_EQ(thing.Call("Kind", With()).ToText(), "Missing");
     EXPECT_EQ(thing.Call("Kind", With(true)).ToText(), "Boolean");
     EXPECT_EQ(thing.Call("Kind", With(Variant())).ToText(), "Empty");
+    EXPECT_EQ(thing.Call("Add", With(1, Variant())).ToLong(), 101) << "null is none, but for a variant";
 }
 
 TEST(Object, RefusesMissingAndSurplusArguments) {
     Thing thing;
     EXPECT_EQ(ErrorOf([&] { thing.Call("Add"); }), errors::argumentMissing);
+    EXPECT_EQ(ErrorOf([&] { thing.Call("Needed"); }), errors::argumentMissing);
     EXPECT_EQ(ErrorOf([&] { thing.Call("Add", With(Variant::Missing(), 2)); }), errors::argumentMissing);
     EXPECT_EQ(ErrorOf([&] { thing.Call("Add", With(1, 2, 3)); }), errors::wrongArguments);
     EXPECT_EQ(ErrorOf([&] { thing.Call("Clear", With(1)); }), errors::wrongArguments);

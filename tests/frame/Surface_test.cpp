@@ -530,7 +530,8 @@ TEST_F(LateBound, TheOtherOperationsAreThereByName) {
     Call("PaintPicture", {picture, 5, 6});
     EXPECT_EQ(Drawn(),
               (Operations{draw::Cls{}, draw::PSet{1, 2, 3}, draw::Print{"12.5", 1, 2}, draw::PaintPicture{5, 6, picture}}));
-    EXPECT_EQ(Call("Point", {1, 1}).ToLong(), -1);
+    EXPECT_EQ(Call("Point", {1, 2}).ToLong(), 3);
+    EXPECT_EQ(Call("Point", {-1, 1}).ToLong(), -1);
     EXPECT_EQ(Call("TextWidth", {"ab"}).ToSingle(), 180);
     EXPECT_EQ(Call("TextHeight", {"ab"}).ToSingle(), 195);
 }

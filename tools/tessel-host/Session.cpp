@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cmath>
 
 #include "controls/Classes.h"
 #include "frame/ClassTable.h"
@@ -223,8 +224,8 @@ Json Session::Form(const Request& request) {
     for (const auto& entry : request.items())
         if (entry.key() != "do" && entry.key() != "name")
             members.emplace_back(frame::FromStrictUtf8(entry.key()), From(entry.value()));
-    const std::string name = NameIn(request);
-    if (Root(name).Get() && !EqualsNoCase(host_.Form().Path(), name)) throw ControlError(frame::errors::keyInUse);
+    const std::string name = RequiredText(request, "name");
+    if (Root(name).Get() && !host_.FindForm(name)) throw ControlError(frame::errors::keyInUse);
     host_.NewForm(name, std::move(members));
     return frame::ToStrictUtf8(name);
 }
@@ -340,9 +341,12 @@ Json Session::Destroy(const Request& request) {
 
 Json Session::Resize(const Request& request) {
     auto& site = SiteOf(request);
-    const float width = From(Required(request, "width")).ToSingle();
-    const float height = From(Required(request, "height")).ToSingle();
-    site.SetSize(width, height);
+    const auto extent = [&](const char* name, float present) {
+        const Json* given = FieldOf(request, name);
+        return given ? From(*given).ToSingle() : present;
+    };
+    const float width = extent("width", site.Width());
+    site.SetSize(width, extent("height", site.Height()));
     return nullptr;
 }
 
@@ -462,8 +466,8 @@ Json Session::Random(const Request& request) {
     std::vector<float> values;
     for (const Json& value : ListIn(request, "values")) {
         const float number = From(value).ToSingle();
-        if (!(number >= 0 && number < 1)) Refuse("A random number is at least 0 and below 1");
-        values.push_back(number);
+        if (!(number >= 0 && number <= 1)) Refuse("A random number is at least 0 and below 1");
+        values.push_back(std::min(number, std::nextafter(1.0f, 0.0f)));  // one that rounds to 1 stays below it
     }
     host_.random.queue.insert(host_.random.queue.end(), values.begin(), values.end());
     return nullptr;
@@ -485,7 +489,10 @@ Json Session::Answers(const Request& request) {
             host_.menus.picks.emplace_back();
         else
             host_.menus.picks.emplace_back([this, path = TextOf(entry, "popup")] {
-                Carry({{"do", "fire"}, {"of", frame::ToStrictUtf8(path)}, {"event", "Click"}});
+                // The entry runs inside the control that showed the menu: its failure is reported as theirs are.
+                const Json reply = Carry({{"do", "fire"}, {"of", frame::ToStrictUtf8(path)}, {"event", "Click"}});
+                if (const Json* error = FieldOf(reply, "error"))
+                    host_.errors.Unhandled(ControlError((*error)["number"], (*error)["description"]), path);
             });
     }
     for (const Json& form : ListIn(request, "form")) {
@@ -515,7 +522,7 @@ frame::ObjectRef Session::Root(std::string_view name) {
     if (auto* site = host_.FindSite(name)) return frame::ObjectRef(site->Control());
     for (const auto& sibling : siblings_)
         if (EqualsNoCase(sibling->Path(), name)) return frame::ObjectRef(*sibling);
-    if (EqualsNoCase(host_.Form().Path(), name)) return frame::ObjectRef(host_.Form());
+    if (auto* form = host_.FindForm(name)) return frame::ObjectRef(*form);
     for (const auto& module : modules_)
         if (EqualsNoCase(module->Path(), name)) return frame::ObjectRef(*module);
     return {};
@@ -564,10 +571,9 @@ headless::HeadlessSite& Session::SiteOf(const Request& request) {
 }
 
 frame::Object& Session::Holder(frame::Object& object, frame::MemberKey key) {
-    if (key.ByNumber() || object.Has(key)) return object;  // the host's own members have names alone
     const auto* control = dynamic_cast<const frame::Control*>(&object);
     auto* site = control ? host_.SiteOf(*control) : nullptr;
-    return site && site->Extender().Has(key) ? site->Extender() : object;
+    return site && !key.ByNumber() ? site->Extender() : object;
 }
 
 Variant Session::From(const Json& json) { return FromJson(json, finder_); }

@@ -66,7 +66,7 @@ class Session {
     /// The object that a request names. To be held while it is used: a value-like object lives only as long as someone does.
     frame::ObjectRef Target(const Request& request);
     headless::HeadlessSite& SiteOf(const Request& request);
-    /// The object that has the member: the control itself, or the host's own members for it.
+    /// The object that has the member: a control answers by name together with the host's own members for it.
     frame::Object& Holder(frame::Object& object, frame::MemberKey key);
 
     // Values.

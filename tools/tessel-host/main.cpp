@@ -16,7 +16,7 @@ int Run(std::istream& input) {
     while (true) {
         const LineRead read = tessel::tools::ReadLine(input, line);
         if (read == LineRead::End) return 0;
-        if (read == LineRead::Line && line.empty()) continue;
+        if (read == LineRead::Line && line.find_first_not_of(" \t") == std::string::npos) continue;
         std::cout << (read == LineRead::TooLong ? session.AnswerTooLong() : session.Answer(line)) << std::endl;
     }
 }

@@ -433,7 +433,7 @@ TEST(LinkReaction, LinkDestroyedWhileTheBoxOfItsPressStandsEndsQuietly) {
     };
     PressInside(link);
     EXPECT_EQ(events, 1);
-    EXPECT_THAT(host.requests, ElementsAre("open Label1", "open Label1"));
+    EXPECT_THAT(host.requests, ElementsAre("open Label1"));
     EXPECT_THAT(host.others.errors.reports, IsEmpty());
 }
 

@@ -8,11 +8,13 @@
 #include <string>
 #include <vector>
 
+#include "controls/link/Link.h"
 #include "tests/frame/TestControl.h"
 
 namespace tessel::headless {
 namespace {
 
+using controls::Link;
 using frame::Handle;
 using frame::ObjectRef;
 using frame::Variant;
@@ -220,7 +222,25 @@ TEST_F(HeadlessHosts, AControlFindsItsFormAndItsSiblings) {
     const TestControl& control = Make();
     EXPECT_EQ(host.SiteOf(control)->Parent(), &host.Form());
     EXPECT_EQ(control.Site()->ParentControls().Count(), 1);
-    EXPECT_EQ(&control.Site()->ParentControls().Item(0), &control);
+    EXPECT_EQ(&control.Site()->ParentControls().Item(0), &ExtenderOf(control));
+}
+
+TEST_F(HeadlessHosts, WhatStandsOnTheFormHasTheHostsMembersAndTheControlsOwn) {
+    Link& link = host.Create<Link>("Link1", {.extender = {{"Left", 90}, {"Tag", "mine"}}});
+    frame::Object& item = host.Form().Item(0);
+    EXPECT_EQ(item.Get("Name").ToText(), "Link1");
+    EXPECT_EQ(item.Get("left").ToSingle(), 90);
+    EXPECT_EQ(item.Get("Tag").ToText(), "mine");
+    EXPECT_EQ(item.Get("Caption").ToText(), "Label1");
+    item.Put("Width", 450);
+    EXPECT_EQ(link.Label1.Width(), 450);
+    item.Put("BackColor", 255);
+    EXPECT_EQ(link.BackColor(), frame::OLE_COLOR(255));
+    Variant target[] = {"a.txt"};
+    EXPECT_EQ(item.Call("OpenLink", target).ToText(), "");
+    EXPECT_FALSE(item.Has("Nothing"));
+    EXPECT_EQ(ErrorOf([&] { item.Get("Nothing"); }), frame::errors::noSuchMember);
+    EXPECT_EQ(ErrorOf([&] { item.Put("Name", "other"); }), frame::errors::notAtRunTime);
 }
 
 TEST_F(HeadlessHosts, AControlStaysOnItsFormWhenAnotherFormIsMade) {

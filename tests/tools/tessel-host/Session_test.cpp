@@ -123,10 +123,10 @@ TEST_F(SessionTest, ANameInUseIsRefusedWhateverHasIt) {
     EXPECT_EQ(Value(R"({"do":"form","name":"Link1"})"), "error 457");
 }
 
-TEST_F(SessionTest, ANameMustNotBeEmpty) {
+TEST_F(SessionTest, OnlyAFormMayBeWithoutAName) {
     EXPECT_EQ(Value(R"({"do":"create","class":"Link","name":""})"), "error 5");
     EXPECT_EQ(Value(R"({"do":"sibling","name":""})"), "error 5");
-    EXPECT_EQ(Value(R"({"do":"form","name":""})"), "error 5");
+    EXPECT_EQ(Value(R"({"do":"form","name":""})"), R"("")");
 }
 
 TEST_F(SessionTest, AControlThatFailsToLoadIsNotThere) {
@@ -180,7 +180,9 @@ TEST_F(SessionTest, ResizeSetsTheSizeAsTheHostDoes) {
     EXPECT_EQ(Value(R"({"do":"resize","of":"Link1","width":100.5,"height":-1})"), "null");
     EXPECT_EQ(Get("Link1.Label1", "Width"), "100.5");
     EXPECT_EQ(Get("Link1", "Height"), "0.0");
-    EXPECT_EQ(Value(R"({"do":"resize","of":"Link1","width":100})"), "error 5");
+    EXPECT_EQ(Value(R"({"do":"resize","of":"Link1","width":100})"), "null");
+    EXPECT_EQ(Get("Link1", "Width"), "100.0");
+    EXPECT_EQ(Get("Link1", "Height"), "0.0");
     EXPECT_EQ(Value(R"({"do":"resize","of":"Link1","width":1e39,"height":1})"), "error 6");
 }
 
@@ -390,14 +392,41 @@ TEST_F(SessionTest, ASiblingWithASurfaceIsDrawnOn) {
     EXPECT_EQ(Value(R"({"do":"call","of":"Q","name":"Cls"})"), "error 438");
 }
 
-TEST_F(SessionTest, AFormTakesThePlaceOfTheOneBefore) {
+TEST_F(SessionTest, AFormHoldsWhatComesNextUntilAnotherIsNamed) {
     EXPECT_EQ(Get("Form1", "Name"), "\"Form1\"");
     EXPECT_EQ(Value(R"({"do":"form","name":"Form2","ScaleMode":3,"ScaleWidth":1500,"BackColor":255,"Caption":"x"})"), "\"Form2\"");
     EXPECT_EQ(Get("Form2", "ScaleWidth"), "100.0");
     EXPECT_EQ(Get("Form2", "BackColor"), "255");
     EXPECT_EQ(Get("Form2", "Caption"), "\"x\"");
     EXPECT_EQ(Get("Form2", "Picture"), "null");
-    EXPECT_EQ(Get("Form1", "Name"), "error 424");
+    EXPECT_EQ(Get("Form1", "Name"), "\"Form1\"");
+    EXPECT_EQ(Value(R"({"do":"form","name":"Form1","Caption":"y"})"), "\"Form1\"");
+    EXPECT_EQ(Value(R"({"do":"form","name":"form2"})"), "\"form2\"");
+    EXPECT_EQ(Get("Form1", "Caption"), "\"y\"");
+    EXPECT_EQ(Get("Form2", "Caption"), "\"x\"");
+}
+
+TEST_F(SessionTest, PlaceSizeAndVisibilityMayComeWithTheExtender) {
+    Answer(R"({"do":"create","class":"Link","name":"L","extender":{"Left":300,"top":200,"Width":900,"Visible":false}})");
+    EXPECT_EQ(Get("L", "Left"), "300.0");
+    EXPECT_EQ(Get("L", "Top"), "200.0");
+    EXPECT_EQ(Get("L.Label1", "Width"), "900.0");
+    EXPECT_EQ(Get("L", "Visible"), "false");
+}
+
+TEST_F(SessionTest, ASurfaceKeepsItsPixels) {
+    Answer(R"({"do":"sibling","name":"P","surface":true,"props":{"Width":150,"Height":90}})");
+    EXPECT_EQ(Get("P", "ScaleWidth"), "150.0");
+    Answer(R"({"do":"call","of":"P","name":"PSet","args":[20,20,255]})");
+    EXPECT_EQ(Value(R"({"do":"call","of":"P","name":"Point","args":[29,29]})"), "255");
+    EXPECT_EQ(Value(R"({"do":"call","of":"P","name":"Point","args":[150,29]})"), "-1");
+}
+
+TEST_F(SessionTest, AColourOfASiblingIsWrittenAsAPositiveNumber) {
+    Answer(R"({"do":"sibling","name":"T","props":{"BackColor":-2147483643}})");
+    EXPECT_EQ(Get("T", "BackColor"), "2147483653");
+    Answer(R"({"do":"put","of":"T","name":"BackColor","value":2147483656})");
+    EXPECT_EQ(Get("T", "BackColor"), "2147483656");
 }
 
 TEST_F(SessionTest, TheInnerSizeOfAFormFollowsItsScale) {
@@ -557,7 +586,7 @@ TEST_F(SessionTest, TimeIsMovedByANumberOfMilliseconds) {
 TEST_F(SessionTest, RandomNumbersLieBelowOne) {
     EXPECT_EQ(Value(R"({"do":"random","values":[0,0.5,0.9999]})"), "null");
     EXPECT_EQ(Value(R"({"do":"random"})"), "null");
-    for (const char* values : {"[1]", "[-0.1]", "[0.5,2]", "7"})
+    for (const char* values : {"[1.1]", "[-0.1]", "[0.5,2]", "7"})
         EXPECT_EQ(Value(std::string(R"({"do":"random","values":)") + values + "}"), "error 5") << values;
     EXPECT_EQ(Value(R"({"do":"random","values":["x"]})"), "error 13");
 }
