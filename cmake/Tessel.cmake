@@ -1,5 +1,9 @@
 # What every library, test and program of the project is made with.
 
+include(CMakePackageConfigHelpers)
+include(GNUInstallDirs)
+set(TESSEL_PACKAGE_FOLDER ${CMAKE_INSTALL_LIBDIR}/cmake/Tesselcontrols4)
+
 add_library(tessel_build_flags INTERFACE)
 target_compile_features(tessel_build_flags INTERFACE cxx_std_20)
 target_compile_options(tessel_build_flags INTERFACE
@@ -20,13 +24,53 @@ if(TESSEL_FUZZ)
 endif()
 
 # tessel_library(frame SOURCES a.cpp b.cpp DEPENDS tessel_frame)
-# A static library tessel_<name> of the folder it stands in, with the project's root on the include path.
+# A static library tessel_<name> of the folder it stands in, with the folder's headers and the project's root on the include
+# path. INSTALL_AS Controls makes it Tesselcontrols4::Controls in the installed package.
 function(tessel_library name)
-    cmake_parse_arguments(ARG "" "" "SOURCES;DEPENDS" ${ARGN})
+    cmake_parse_arguments(ARG "" "INSTALL_AS" "SOURCES;DEPENDS" ${ARGN})
+    file(GLOB headers CONFIGURE_DEPENDS *.h)
     add_library(tessel_${name} STATIC ${ARG_SOURCES})
-    target_include_directories(tessel_${name} PUBLIC $<BUILD_INTERFACE:${PROJECT_SOURCE_DIR}>)
+    target_sources(tessel_${name} PUBLIC FILE_SET HEADERS BASE_DIRS ${PROJECT_SOURCE_DIR} FILES ${headers})
     target_compile_features(tessel_${name} PUBLIC cxx_std_20)
     target_link_libraries(tessel_${name} PUBLIC ${ARG_DEPENDS} PRIVATE $<BUILD_INTERFACE:tessel_build_flags>)
+    set_target_properties(tessel_${name} PROPERTIES EXPORT_NAME internal::${name})
+    if(ARG_INSTALL_AS)
+        set_target_properties(tessel_${name} PROPERTIES EXPORT_NAME ${ARG_INSTALL_AS})
+        tessel_install_part(${ARG_INSTALL_AS} tessel_${name})
+    endif()
+endfunction()
+
+# A part of the package: one library of the project with all that it depends on, less what earlier parts brought.
+function(tessel_install_part part library)
+    tessel_install_library(${part} ${library})
+    install(EXPORT Tesselcontrols4${part} NAMESPACE Tesselcontrols4:: DESTINATION ${TESSEL_PACKAGE_FOLDER})
+    set_property(GLOBAL APPEND PROPERTY TESSEL_INSTALLED_PARTS ${part})
+endfunction()
+
+function(tessel_install_library part library)
+    get_property(installed GLOBAL PROPERTY TESSEL_INSTALLED_LIBRARIES)
+    if(library IN_LIST installed)
+        return()
+    endif()
+    set_property(GLOBAL APPEND PROPERTY TESSEL_INSTALLED_LIBRARIES ${library})
+    install(TARGETS ${library} EXPORT Tesselcontrols4${part}
+        ARCHIVE FILE_SET HEADERS DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}/tesselcontrols4)
+    get_target_property(needed ${library} INTERFACE_LINK_LIBRARIES)
+    list(FILTER needed INCLUDE REGEX "^tessel_")
+    foreach(other IN LISTS needed)
+        tessel_install_library(${part} ${other})
+    endforeach()
+endfunction()
+
+# What find_package(Tesselcontrols4) reads: all parts, so it stands after the libraries.
+function(tessel_install_package)
+    get_property(parts GLOBAL PROPERTY TESSEL_INSTALLED_PARTS)
+    configure_package_config_file(${PROJECT_SOURCE_DIR}/cmake/Tesselcontrols4Config.cmake.in
+        ${PROJECT_BINARY_DIR}/Tesselcontrols4Config.cmake INSTALL_DESTINATION ${TESSEL_PACKAGE_FOLDER})
+    write_basic_package_version_file(${PROJECT_BINARY_DIR}/Tesselcontrols4ConfigVersion.cmake
+        COMPATIBILITY SameMajorVersion)
+    install(FILES ${PROJECT_BINARY_DIR}/Tesselcontrols4Config.cmake ${PROJECT_BINARY_DIR}/Tesselcontrols4ConfigVersion.cmake
+        DESTINATION ${TESSEL_PACKAGE_FOLDER})
 endfunction()
 
 # tessel_program(tessel-host SOURCES main.cpp DEPENDS tessel_headless)
