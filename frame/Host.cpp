@@ -61,7 +61,7 @@ void Host::Unhandled(const ControlError& error, const std::string& where) { serv
 void Host::Flush() {
     if (flushing_) return;
     struct Flushing {
-        explicit Flushing(bool& running) : flag(running) { flag = true; }
+        explicit Flushing(bool& running) : flag(running) { running = true; }
         ~Flushing() { flag = false; }
         bool& flag;
     } const running(flushing_);

@@ -111,7 +111,7 @@ std::string TextOf(Float value, int digits) {
     if (std::isnan(value)) return "NaN";
     if (std::isinf(value)) return value < 0 ? "-Infinity" : "Infinity";
     if (value == 0) return "0";
-    std::array<char, 32> buffer;
+    std::array<char, 32> buffer{};
     char* const end = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value, std::chars_format::general, digits).ptr;
     std::replace(buffer.data(), end, 'e', 'E');
     return std::string(buffer.data(), end);

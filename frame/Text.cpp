@@ -225,7 +225,7 @@ std::string FromStrictUtf8(std::string_view strict) {
 }
 
 std::string Decimal(std::int64_t value) {
-    std::array<char, 20> digits;  // the sign and 19 digits of the smallest value
+    std::array<char, 20> digits{};  // the sign and 19 digits of the smallest value
     const auto written = std::to_chars(digits.data(), digits.data() + digits.size(), value);
     return std::string(digits.data(), written.ptr);
 }

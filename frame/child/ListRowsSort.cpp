@@ -96,10 +96,10 @@ void ListRows::MoveUnsettled() {
     const bool standsStill = std::all_of(moving.begin(), moving.end(), [](const Moving& row) { return row.from == row.to; });
     if (standsStill) return;
 
-    for (auto row = leaving.rbegin(); row != leaving.rend(); ++row) {
-        order_.Remove(row->from);
-        if (followed_) journal_.Removed(row->from);
-    }
+    std::for_each(leaving.rbegin(), leaving.rend(), [this](const Moving& row) {
+        order_.Remove(row.from);
+        if (followed_) journal_.Removed(row.from);
+    });
     for (const Moving& row : moving) {
         order_.Insert(row.to, row.row);
         if (followed_) journal_.Inserted(row.to);

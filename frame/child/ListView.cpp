@@ -59,7 +59,7 @@ float ListView::RowTop(ListRows::Position position) const {
 }
 
 ListItemRef ListView::ItemOf(RowId row) const {
-    return std::make_shared<ListItem>(const_cast<ListView&>(*this), rows_.Ref(row));  // who may read a row may change it
+    return std::make_shared<ListItem>(const_cast<ListView&>(*this), rows_.Ref(row));  // NOLINT: who may read a row may change it
 }
 
 void ListView::ItemClickInput(std::int32_t index) {

@@ -13,7 +13,7 @@ using frame::Variant;
 /// by name. The geometry is the site's; all else is what the host was given.
 class HeadlessSite::ExtenderObject final : public HostObject {
   public:
-    ExtenderObject(HeadlessSite& site, Members members) : HostObject(site.name_, std::move(members)), site_(site) {}
+    ExtenderObject(HeadlessSite& site, const Members& members) : HostObject(site.name_, members), site_(site) {}
 
     Variant Get(frame::MemberKey key, frame::Arguments arguments = {}) override {
         if (const auto* own = Find(key)) return own->get(*this, arguments);

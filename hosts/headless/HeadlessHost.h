@@ -127,7 +127,7 @@ class HeadlessHost {
     void TakeOffForms(const frame::Object& object);
 
     /// What a control writes when its design is saved.
-    frame::MemoryBag Save(frame::Control& control);
+    static frame::MemoryBag Save(frame::Control& control);
 
     Log log;
     VirtualClock clock;

@@ -31,17 +31,16 @@ double ShortestDouble(float value) {
     return result;
 }
 
-Json FontToJson(const frame::Font& font) {
+Json FontToJson(frame::Font& font) {
     Json json = Json::object();
-    for (const frame::Member& member : font.Table().members)
-        json[std::string(member.name)] = ToJson(member.get(const_cast<frame::Font&>(font), {}));
+    for (const frame::Member& member : font.Table().members) json[std::string(member.name)] = ToJson(member.get(font, {}));
     return json;
 }
 
 Json ObjectToJson(const frame::ObjectRef& object) {
-    const frame::Object* target = object.Get();
+    frame::Object* target = object.Get();
     if (!target) return nullptr;
-    if (const auto* font = dynamic_cast<const frame::Font*>(target)) return FontToJson(*font);
+    if (auto* font = dynamic_cast<frame::Font*>(target)) return FontToJson(*font);
     if (const auto* picture = dynamic_cast<const frame::Picture*>(target))
         return {{"picture", frame::ToStrictUtf8(picture->Source())}};
     return {{"object", frame::ToStrictUtf8(target->Path())}};
@@ -62,7 +61,7 @@ Variant ValueFrom(const Json& json, const ObjectFinder& finder, int depth);
 bool IsFont(const Json& json) {
     const frame::Font sample;
     if (json.empty()) return false;
-    for (const auto& entry : json.items())
+    for (const auto& entry : json.items())  // NOLINT(readability-use-anyofallof): what items() gives is no range
         if (!sample.Table().Find(std::string_view(entry.key()))) return false;
     return true;
 }

@@ -99,7 +99,7 @@ Json Parse(std::string_view line) {
 }  // namespace
 
 /// What a script has put in place of the application's handler of an event.
-struct Session::Handler {
+struct Session::Handler {  // NOLINT(bugprone-exception-escape): the JSON library's destructor throws nothing
     Json set, when, run;
     std::optional<int> times;
 };
@@ -264,7 +264,7 @@ Json Session::Create(const Request& request) {
     headless::Placing placing;
     if (const Json* mode = FieldOf(request, "mode")) {
         const std::string text = TextOf(*mode, "mode");
-        if (text != "run" && text != "design") Refuse("\"mode\" must be \"run\" or \"design\"");
+        if (text != "run" && text != "design") Refuse(R"("mode" must be "run" or "design")");
         placing.designTime = text == "design";
     }
     frame::MemoryBag bag;
