@@ -43,6 +43,7 @@ void Site::Adopt(std::unique_ptr<frame::Control> control) {
 }
 
 void Site::Start(const PropertyBag* saved, std::optional<float> width, std::optional<float> height) {
+    const Callout callout(host_);
     if (saved)
         control_->ReadProperties(*saved);
     else

@@ -288,8 +288,8 @@ class Host {
     /// An error that has left a control where no caller can take it.
     void Unhandled(const ControlError& error, const std::string& where);
 
-    /// Tells the peers of all changed children. Runs by itself before each question to a peer, at each turn, and when the
-    /// outermost call from outside has ended.
+    /// Tells the peers of all changed children. Runs by itself before every service that may let the user in, and when the
+    /// outermost call from outside has ended. Whoever asks a screen something calls it before.
     void Flush();
     /// What a host does at a turn of its message loop: flushes, and frees what was retired if nothing is running.
     void Settle();

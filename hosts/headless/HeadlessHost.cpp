@@ -201,25 +201,29 @@ class HeadlessHost::Peers final : public frame::PeerFactory {
 };
 
 HeadlessHost::HeadlessHost() : peers_(std::make_unique<Peers>(*this)) {
-    host_ = std::make_unique<frame::Host>(frame::Services{.loop = &loop,
-                                                          .dialogs = &dialogs,
-                                                          .menus = &menus,
-                                                          .drag = &drag,
-                                                          .focus = &focus,
-                                                          .clock = &clock,
-                                                          .random = &random,
-                                                          .locale = &locale,
-                                                          .codePage = &codePage,
-                                                          .pictures = &pictures,
-                                                          .metrics = &metrics,
-                                                          .colors = &frame::ClassicColors(),
-                                                          .application = &application,
-                                                          .files = &files,
-                                                          .shell = &shell,
-                                                          .clipboard = &clipboard,
-                                                          .peers = peers_.get(),
-                                                          .errors = &errors});
+    host_ = std::make_unique<frame::Host>(LentServices());
     NewForm("Form1");
+}
+
+frame::Services HeadlessHost::LentServices() {
+    return {.loop = &loop,
+            .dialogs = &dialogs,
+            .menus = &menus,
+            .drag = &drag,
+            .focus = &focus,
+            .clock = &clock,
+            .random = &random,
+            .locale = &locale,
+            .codePage = &codePage,
+            .pictures = &pictures,
+            .metrics = &metrics,
+            .colors = &frame::ClassicColors(),
+            .application = &application,
+            .files = &files,
+            .shell = &shell,
+            .clipboard = &clipboard,
+            .peers = peers_.get(),
+            .errors = &errors};
 }
 
 HeadlessHost::~HeadlessHost() {

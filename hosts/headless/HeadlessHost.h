@@ -105,6 +105,8 @@ class HeadlessHost {
 
     frame::Host& Frame() { return *host_; }
     operator frame::Host&() { return *host_; }
+    /// All services of this host, for one that puts its own in the place of some.
+    frame::Services LentServices();
 
     /// The form that holds what is created next; "Form1" at first.
     HeadlessForm& Form() { return *form_; }

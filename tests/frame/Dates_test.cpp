@@ -11,22 +11,15 @@
 
 #include "frame/Error.h"
 
+#include "tests/ErrorOf.h"
+
 namespace tessel::frame {
 namespace {
 
+using test::ErrorOf;
+
 constexpr double firstDay = -657'434, lastDay = 2'958'465;
 constexpr double secondsPerDay = 86'400;
-
-/// The number of the error that `run` ends with; 0 for none.
-template <class F>
-int ErrorOf(F&& run) {
-    try {
-        run();
-    } catch (const ControlError& error) {
-        return error.Number();
-    }
-    return 0;
-}
 
 std::string Parsed(std::string_view text) {
     const auto date = ParseDate(text);

@@ -124,28 +124,32 @@ struct Entries : testing::Test {
     AskingDrag drag;
     AskingShell shell;
     Screen screen;
-    Host host{{.loop = &loop,
-               .dialogs = &boxes,
-               .menus = &menus,
-               .drag = &drag,
-               .focus = &others.focus,
-               .clock = &others.clock,
-               .random = &others.random,
-               .locale = &others.locale,
-               .codePage = &others.codePage,
-               .pictures = &others.pictures,
-               .metrics = &others.metrics,
-               .colors = &ClassicColors(),
-               .application = &others.application,
-               .files = &others.files,
-               .shell = &shell,
-               .clipboard = &others.clipboard,
-               .peers = &screen,
-               .errors = &others.errors}};
+    Services Mixed() {
+        Services services = others.LentServices();
+        services.loop = &loop;
+        services.dialogs = &boxes;
+        services.menus = &menus;
+        services.drag = &drag;
+        services.shell = &shell;
+        services.peers = &screen;
+        return services;
+    }
+    Host host{Mixed()};
     std::vector<std::unique_ptr<WatchedSite>> sites;
 };
 
 // The end of a control
+
+TEST_F(Entries, ASiteMayBeRetiredByItsHostWhileItStarts) {
+    auto site = std::make_unique<WatchedSite>(host, "Test1");
+    WatchedSite& started = *site;
+    site->Adopt(std::make_unique<TestControl>(host));
+    started.whenSized = [&] { host.Retire(std::move(site)); };
+    started.Start(nullptr, 300.0f, 200.0f);
+    EXPECT_EQ(started.Width(), 300) << "it is there until the host has a turn";
+    EXPECT_EQ(started.Control().Site(), nullptr);
+    host.Settle();
+}
 
 TEST_F(Entries, RetiringOutsideAnyCallFreesAtOnce) {
     TestControl& control = Add();

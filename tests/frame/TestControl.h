@@ -16,20 +16,10 @@
 #include "frame/Event.h"
 #include "frame/PropertyBag.h"
 #include "frame/Site.h"
+#include "tests/ErrorOf.h"
 
 /// A control, a child, a peer and a site for tests of the frame: small, with one member of each kind.
 namespace tessel::test {
-
-/// The number of the error that `run` ends with; 0 for none.
-template <class F>
-int ErrorOf(F&& run) {
-    try {
-        run();
-    } catch (const frame::ControlError& error) {
-        return error.Number();
-    }
-    return 0;
-}
 
 inline frame::MemoryBag BagOf(frame::MemoryBag::Contents contents) { return contents; }
 
@@ -255,6 +245,7 @@ class WatchedSite final : public frame::Site, private frame::AmbientProperties, 
     frame::FontRef font = std::make_shared<frame::Font>();
     std::vector<std::string> changed;
     int moves = 0, repaints = 0;
+    std::function<void()> whenSized;
     frame::Handlers handlers;
 
     const frame::AmbientProperties& Ambient() const override { return *this; }
@@ -267,7 +258,10 @@ class WatchedSite final : public frame::Site, private frame::AmbientProperties, 
 
   protected:
     void Placed() override { ++moves; }
-    void Sized() override { ++moves; }
+    void Sized() override {
+        ++moves;
+        if (whenSized) whenSized();
+    }
 
   private:
     bool UserMode() const override { return userMode; }

@@ -21,8 +21,12 @@
 #include "frame/Error.h"
 #include "frame/Numbers.h"
 
+#include "tests/ErrorOf.h"
+
 namespace tessel::frame {
 namespace {
+
+using test::ErrorOf;
 
 constexpr double infinity = std::numeric_limits<double>::infinity();
 constexpr double nan = std::numeric_limits<double>::quiet_NaN();
@@ -31,17 +35,6 @@ constexpr auto floatInfinity = std::numeric_limits<float>::infinity();
 constexpr VarType allTypes[] = {VarType::Empty, VarType::Missing, VarType::Boolean, VarType::Integer,
                                 VarType::Long,  VarType::Single,  VarType::Double,  VarType::String,
                                 VarType::Date,  VarType::Object,  VarType::Array};
-
-/// The number of the error that `run` ends with; 0 for none.
-template <class F>
-int ErrorOf(F&& run) {
-    try {
-        run();
-    } catch (const ControlError& error) {
-        return error.Number();
-    }
-    return 0;
-}
 
 /// An object whose default member holds a value. Equal to another one with the same rank, whatever they hold.
 class Holder final : public Object {

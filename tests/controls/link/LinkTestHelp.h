@@ -184,24 +184,15 @@ class WatchedHost {
     Shelling shell_{*this};
     FontMetrics metrics_;
     CountingPeers peers_{*this};
-    frame::Host frame_{frame::Services{.loop = &others.loop,
-                                       .dialogs = &dialogs_,
-                                       .menus = &others.menus,
-                                       .drag = &others.drag,
-                                       .focus = &others.focus,
-                                       .clock = &others.clock,
-                                       .random = &others.random,
-                                       .locale = &others.locale,
-                                       .codePage = &others.codePage,
-                                       .pictures = &others.pictures,
-                                       .metrics = &metrics_,
-                                       .colors = &frame::ClassicColors(),
-                                       .application = &others.application,
-                                       .files = &others.files,
-                                       .shell = &shell_,
-                                       .clipboard = &others.clipboard,
-                                       .peers = &peers_,
-                                       .errors = &others.errors}};
+    frame::Services Mixed() {
+        frame::Services services = others.LentServices();
+        services.dialogs = &dialogs_;
+        services.metrics = &metrics_;
+        services.shell = &shell_;
+        services.peers = &peers_;
+        return services;
+    }
+    frame::Host frame_{Mixed()};
     std::unique_ptr<frame::Site> owned_;
     WatchedSite* site_ = nullptr;
 };

@@ -17,12 +17,14 @@
 #include "frame/ResumeNext.h"
 #include "frame/Text.h"
 #include "hosts/headless/HeadlessHost.h"
+#include "tests/ErrorOf.h"
 
 namespace tessel::child {
 namespace {
 
 using frame::ObjectRef;
 using frame::Variant;
+using test::ErrorOf;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::SizeIs;
@@ -150,16 +152,6 @@ class ListViewTest : public testing::Test {
         host.Frame().Flush();
         shown.seen.clear();
         return shown;
-    }
-
-    template <class F>
-    static int ErrorOf(F&& call) {
-        try {
-            call();
-        } catch (const frame::ControlError& error) {
-            return error.Number();
-        }
-        return 0;
     }
 
     headless::HeadlessHost host;
