@@ -35,6 +35,7 @@ std::string ErrorText(int number) {
         Words{errors::notPermitted, "Property cannot be set now"},
         Words{errors::objectRequired, "Object required"},
         Words{errors::noSuchMember, "The object has no such member"},
+        Words{errors::notSupported, "The host does not offer this"},
         Words{errors::argumentMissing, "Argument missing"},
         Words{errors::wrongArguments, "Wrong number of arguments"},
         Words{errors::keyInUse, "Key already in use"},

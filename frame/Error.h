@@ -33,6 +33,7 @@ inline constexpr int notAtRunTime = 382;
 inline constexpr int notPermitted = 387;
 inline constexpr int objectRequired = 424;
 inline constexpr int noSuchMember = 438;
+inline constexpr int notSupported = 445;
 inline constexpr int argumentMissing = 449;
 inline constexpr int wrongArguments = 450;
 inline constexpr int keyInUse = 457;

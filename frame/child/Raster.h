@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <optional>
+#include <span>
 #include <vector>
 
 #include "frame/Color.h"
@@ -41,6 +42,8 @@ class Raster final : public frame::Canvas {
 
     /// RGB; nothing outside the plane.
     std::optional<frame::OLE_COLOR> Pixel(int x, int y) const;
+    /// All pixels as 0x00BBGGRR, row by row.
+    std::span<const std::uint32_t> Pixels() const { return pixels; }
     /// Outside the plane nothing happens.
     void SetPixel(int x, int y, frame::OLE_COLOR color);
 

@@ -3,73 +3,39 @@
 #include <algorithm>
 
 #include "frame/ClassTable.h"
+#include "frame/Extender.h"
 #include "frame/Text.h"
 
 namespace tessel::headless {
 
 using frame::Variant;
 
-/// The host's own members of a control, and behind them the control's: what stands on the form for all who reach the control
-/// by name. The geometry is the site's; all else is what the host was given.
-class HeadlessSite::ExtenderObject final : public HostObject {
+/// Beside the geometry the host has what it was given, and a tool tip once one is set.
+class HeadlessSite::ExtenderObject final : public frame::Extender {
   public:
-    ExtenderObject(HeadlessSite& site, const Members& members) : HostObject(site.name_, members), site_(site) {}
+    ExtenderObject(HeadlessSite& site, const HostObject::Members& members)
+        : Extender(site), site_(site), given_(site.name_, members) {}
 
-    Variant Get(frame::MemberKey key, frame::Arguments arguments = {}) override {
-        if (const auto* own = Find(key)) return own->get(*this, arguments);
-        return HostObject::Has(key) ? HostObject::Get(key, arguments) : site_.Control().Get(key, arguments);
-    }
-    void Put(frame::MemberKey key, const Variant& value, frame::Arguments arguments = {}) override {
-        if (const auto* own = Find(key)) {
-            if (!own->set) throw frame::ControlError(frame::errors::notAtRunTime);
-            own->set(*this, arguments, value);
-        } else if (IsToolTip(key)) {
-            SetMember("ToolTipText", value);
-        } else if (HostObject::Has(key)) {
-            HostObject::Put(key, value, arguments);
-        } else {
-            site_.Control().Put(key, value, arguments);
-        }
-    }
-    Variant Call(frame::MemberKey key, frame::Arguments arguments = {}) override {
-        return Find(key) || HostObject::Has(key) ? Get(key, arguments) : site_.Control().Call(key, arguments);
-    }
-    bool Has(frame::MemberKey key) const override {
-        return Find(key) || IsToolTip(key) || HostObject::Has(key) || site_.Control().Has(key);
-    }
-    frame::ObjectRef Inner(std::string_view name) override { return site_.Control().Inner(name); }
-    const frame::ClassTable& Table() const override { return site_.Control().Table(); }
+    std::string Name() const override { return site_.name_; }
+    bool Visible() const override { return site_.visible_; }
+    void SetVisible(bool value) override { site_.SetVisible(value); }
 
-    std::string Name() const { return site_.name_; }
-    float Left() const { return site_.Left(); }
-    void SetLeft(float value) { site_.SetPlace(value, site_.Top()); }
-    float Top() const { return site_.Top(); }
-    void SetTop(float value) { site_.SetPlace(site_.Left(), value); }
-    float Width() const { return site_.Width(); }
-    void SetWidth(float value) { site_.SetSize(value, site_.Height()); }
-    float Height() const { return site_.Height(); }
-    void SetHeight(float value) { site_.SetSize(site_.Width(), value); }
-    bool Visible() const { return site_.visible_; }
-    void SetVisible(bool value) { site_.SetVisible(value); }
+  protected:
+    const Object& More() const override { return given_; }
 
   private:
-    static bool IsToolTip(frame::MemberKey key) { return !key.ByNumber() && frame::EqualsNoCase(key.Name(), "ToolTipText"); }
-    /// The row of one of the host's own members; they have names alone.
-    static const frame::Member* Find(frame::MemberKey key) {
-        using E = ExtenderObject;
-        static constexpr std::array rows = {
-            frame::property<&E::Name>("Name"),
-            frame::property<&E::Left, &E::SetLeft>("Left"),
-            frame::property<&E::Top, &E::SetTop>("Top"),
-            frame::property<&E::Width, &E::SetWidth>("Width"),
-            frame::property<&E::Height, &E::SetHeight>("Height"),
-            frame::property<&E::Visible, &E::SetVisible>("Visible"),
-        };
-        static constexpr frame::ClassTable table{.name = "Extender", .members = rows};
-        return key.ByNumber() ? nullptr : table.Find(key);
-    }
+    struct GivenMembers final : HostObject {
+        using HostObject::HostObject;
+        static bool IsToolTip(frame::MemberKey key) { return !key.ByNumber() && frame::EqualsNoCase(key.Name(), "ToolTipText"); }
+        bool Has(frame::MemberKey key) const override { return IsToolTip(key) || HostObject::Has(key); }
+        void Put(frame::MemberKey key, const Variant& value, frame::Arguments arguments = {}) override {
+            if (IsToolTip(key) && !HostObject::Has(key)) SetMember("ToolTipText", {});
+            HostObject::Put(key, value, arguments);
+        }
+    };
 
     HeadlessSite& site_;
+    GivenMembers given_;
 };
 
 /// Writes each event into the log, then lets the script and the application handle it.

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "frame/Control.h"
+#include "frame/Windows1252.h"
 #include "hosts/headless/HostObject.h"
 #include "hosts/headless/Log.h"
 #include "hosts/headless/Services.h"
@@ -141,7 +142,7 @@ class HeadlessHost {
     ScriptedShell shell{log};
     ScriptedRandom random;
     FixedLocale locale;
-    Windows1252 codePage;
+    frame::Windows1252 codePage;
     FixedMetrics metrics;
     NoPictures pictures;
     FixedApplication application;

@@ -105,13 +105,6 @@ class FixedLocale final : public frame::Locale {
     frame::Date LocalTime(std::int64_t seconds) override;
 };
 
-/// The code page Windows-1252.
-class Windows1252 final : public frame::CodePage {
-  public:
-    std::optional<std::string> ToNarrow(std::string_view text) override;
-    std::string FromNarrow(std::string_view bytes) override;
-};
-
 /// Every character is 6 pixels wide and every line 13 pixels high, in every font.
 class FixedMetrics final : public frame::TextMetrics {
   public:

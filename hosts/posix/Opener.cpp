@@ -233,7 +233,6 @@ int Opener::Run(const std::vector<std::string>& command, const std::string& argu
     if (command.empty()) return opened::noProgram;
     std::vector<std::string> words = command;
     words.push_back(argument);
-    running_.reserve(running_.size() + 1);
     pid_t program = 0;
     if (const int error = StartPlan().Start(std::move(words), program)) return AnswerOfStart(error);
 
@@ -249,12 +248,14 @@ int Opener::Run(const std::vector<std::string>& command, const std::string& argu
         if (std::chrono::duration_cast<std::chrono::milliseconds>(steady_clock::now() - start) >= settings_.wait) break;
         std::this_thread::sleep_for(pause);
     }
+    const std::lock_guard lock(guard_);
     running_.push_back(program);
     return opened::success;
 }
 
 /// Takes leave of the programs that have ended since.
 void Opener::Reap() {
+    const std::lock_guard lock(guard_);
     std::erase_if(running_, [](pid_t program) { return waitpid(program, nullptr, WNOHANG) != 0; });
 }
 

@@ -3,6 +3,7 @@
 #include <sys/types.h>
 
 #include <chrono>
+#include <mutex>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -37,7 +38,7 @@ inline constexpr int failed = 1, fileMissing = 2, folderMissing = 3, accessDenie
 /// A path is handed on as an absolute one. A file that could itself be run is never opened, so that following a link runs no
 /// code that the link brought: that is a file with an execute permission, and one named ".desktop".
 ///
-/// For one thread. Installs no signal handler and changes nothing of the program that it works in.
+/// May be asked from several threads at a time. Installs no signal handler and changes nothing of the program that it works in.
 class Opener {
   public:
     explicit Opener(OpenerSettings settings = {});
@@ -53,6 +54,7 @@ class Opener {
     void Reap();
 
     OpenerSettings settings_;
+    std::mutex guard_;            // of what follows
     std::vector<pid_t> running_;  // programs that were not waited for to their end
 };
 

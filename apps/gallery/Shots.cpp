@@ -1,0 +1,42 @@
+#include "apps/gallery/Shots.h"
+
+#include <QApplication>
+#include <QDir>
+#include <QPixmap>
+#include <QTextStream>
+
+#include "apps/gallery/Page.h"
+#include "apps/gallery/Window.h"
+
+namespace tessel::gallery {
+
+int TakeShots(const QString& folder) {
+    QTextStream out(stdout), complaint(stderr);
+    if (!QDir().mkpath(folder)) {
+        complaint << "gallery: cannot make the folder " << folder << '\n';
+        return 1;
+    }
+    for (const auto& [scheme, name] : {std::pair(Scheme::Light, "light"), std::pair(Scheme::Dark, "dark")}) {
+        Follow(scheme);
+        Window window;
+        window.setAttribute(Qt::WA_DontShowOnScreen);
+        window.show();
+        for (qsizetype i = 0; i < window.pages().size(); ++i) {
+            Page* page = window.pages()[i];
+            window.choose(static_cast<int>(i));
+            QApplication::processEvents();
+            page->pose();
+            QApplication::processEvents();
+            const QString file =
+                QString("%1/%2-%3-%4x.png").arg(folder, page->title().toLower(), name).arg(window.devicePixelRatioF());
+            if (!window.grab().save(file)) {
+                complaint << "gallery: cannot write " << file << '\n';
+                return 1;
+            }
+            out << file << '\n';
+        }
+    }
+    return 0;
+}
+
+}  // namespace tessel::gallery

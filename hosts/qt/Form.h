@@ -1,0 +1,43 @@
+#pragma once
+
+#include <QObject>
+#include <memory>
+#include <vector>
+
+#include "frame/Site.h"
+#include "hosts/qt/WidgetObject.h"
+
+namespace tessel::qt {
+
+/// A form with what stands on it: its named widgets in the order of their creation, without the inner parts of the toolkit (names
+/// that begin with "qt_"), of the library's own controls, and of windows and forms that stand on it. A control is met as its
+/// extender. Qt does not tell how old a widget is: those that are met in one look are taken in the order of the widgets' tree.
+class Form final : public QObject, public WidgetObject, public frame::Siblings {
+  public:
+    /// The form of a widget, made when first asked for; it goes with its widget.
+    static Form& of(QWidget& formWidget);
+
+    int Count() const override;
+    frame::Object& Item(int index) override;
+
+    using WidgetObject::Get;
+    const frame::ClassTable& Table() const override;
+
+    /// The inner size in twips.
+    float ScaleWidth() const;
+    float ScaleHeight() const;
+
+  private:
+    explicit Form(QWidget& widget);
+    struct Member {
+        QPointer<QWidget> widget;
+        std::unique_ptr<WidgetObject> object;  // none for a control, which brings its own
+    };
+
+    void Look();
+    void LookInto(const QWidget& parent);
+
+    std::vector<Member> members_;
+};
+
+}  // namespace tessel::qt

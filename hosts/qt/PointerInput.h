@@ -1,0 +1,42 @@
+#pragma once
+
+#include <QMouseEvent>
+#include <QPointer>
+#include <QWidget>
+#include <cstdint>
+
+#include "frame/child/PointerChild.h"
+
+namespace tessel::qt {
+
+std::int16_t ButtonsOf(Qt::MouseButtons buttons);
+std::int16_t ShiftOf(Qt::KeyboardModifiers modifiers);
+
+/// Reports the mouse over a widget to the child that it shows. A press, its release and the click are MouseDown, MouseUp and
+/// Click; the second press of a double click is DblClick alone, and its release MouseUp alone. A pointer that leaves is reported
+/// as a move to the nearest point of the edge, so that a child which senses the leaving by its edge strip always does.
+///
+/// An input may end the child and its peer: the peer disconnects this object, which lives as long as the widget.
+class PointerInput {
+  public:
+    PointerInput(child::PointerChild& child, QWidget& widget) : child_(&child), widget_(widget) {}
+    /// From now on nothing is reported.
+    void Disconnect() { child_ = nullptr; }
+
+    void Press(const QMouseEvent& event);
+    void Move(const QMouseEvent& event);
+    void Release(const QMouseEvent& event);
+    void DoubleClick(const QMouseEvent& event);
+    void Leave();
+
+  private:
+    void ReportMove(Qt::MouseButtons buttons, Qt::KeyboardModifiers modifiers, float x, float y);
+
+    child::PointerChild* child_;  // null once it has gone
+    QWidget& widget_;
+    Qt::MouseButtons held_;       // whose press was reported
+    bool doubleClicked_ = false;  // the release that comes now makes no click
+    bool inside_ = false;         // a move inside was reported
+};
+
+}  // namespace tessel::qt

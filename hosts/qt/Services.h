@@ -1,0 +1,123 @@
+#pragma once
+
+#include <QTimer>
+#include <functional>
+#include <memory>
+#include <random>
+#include <unordered_map>
+#include <utility>
+
+#include "frame/host.h"
+#include "hosts/posix/Opener.h"
+
+/// The services of the Qt host.
+namespace tessel::qt {
+
+class EventLoop final : public frame::MessageLoop {
+  public:
+    explicit EventLoop(std::function<void()> settle);
+    void Turn() override;
+    void WantTurn() override;
+
+  private:
+    QTimer soon_;
+};
+
+/// Boxes and dialogs stand over the active window.
+class WidgetDialogs final : public frame::Dialogs {
+  public:
+    int MsgBox(const std::string& text, int style, const std::string& title) override;
+    void ShowOpen(const std::string& title, const std::string& filter, std::string& fileName) override;
+    /// Error 445: no form of the library has a window on this host yet.
+    void ShowModal(frame::Object& form) override;
+};
+
+/// What no control on this host asks for yet: error 445.
+class Unoffered final : public frame::Menus, public frame::DragAndDrop, public frame::Clipboard {
+  public:
+    void Popup(frame::Object& menu, frame::Object* defaultEntry) override;
+    void Start(frame::ChildControl& source) override;
+    void Clear() override;
+    bool Has(int format) override;
+    bool Put(int format, std::string bytes) override;
+    std::optional<std::string> Read(int format) override;
+};
+
+class WidgetFocus final : public frame::Focus {
+  public:
+    void Set(frame::ChildControl& child) override;
+};
+
+class SystemClock final : public frame::Clock {
+  public:
+    frame::Date Now() override;
+    void Start(frame::TimerClient& client, int interval) override;
+    void Stop(frame::TimerClient& client) override;
+
+  private:
+    std::unordered_map<frame::TimerClient*, std::unique_ptr<QTimer>> timers_;
+};
+
+class Generator final : public frame::Random {
+  public:
+    Generator() { RestartFromClock(); }
+    float Next() override;
+    void Restart(double seed) override;
+    void RestartFromClock() override;
+
+  private:
+    std::mt19937 engine_;
+};
+
+/// The user's locale.
+class UserLocale final : public frame::Locale {
+  public:
+    std::string DateText(frame::Date date) override;
+    std::string LongDateText(frame::Date date) override;
+    std::string Grouped(std::int64_t number) override;
+    frame::Date LocalTime(std::int64_t seconds) override;
+};
+
+class ImageLoader final : public frame::PictureLoader {
+  public:
+    frame::PictureRef LoadPicture(const std::string& fileName) override;
+    /// Error 445: no control on this host asks for it yet.
+    frame::PictureRef FileIcon(const std::string& path, int flags) override;
+};
+
+/// Measures as the widgets of this host paint.
+class FontMetrics final : public frame::TextMetrics {
+  public:
+    frame::TextSize Measure(const frame::Font& font, std::string_view text, std::optional<float> wrapWidth) override;
+};
+
+/// The application's palette as system colours.
+class PaletteColors final : public frame::SystemColors {
+  public:
+    frame::OLE_COLOR Color(int index) const override;
+};
+
+class Program final : public frame::Application {
+  public:
+    std::string Path() override;
+    int ScreenMousePointer() override { return pointer_; }
+    void SetScreenMousePointer(int pointer) override;
+    ~Program() override { SetScreenMousePointer(0); }
+
+  private:
+    int pointer_ = 0;
+};
+
+/// Opens and prints with the desktop's programs. While a program starts, the message loop runs.
+class DesktopShell final : public frame::Shell {
+  public:
+    explicit DesktopShell(posix::OpenerSettings settings = {}) : opener_(std::move(settings)) {}
+    int Execute(std::string_view verb, const std::string& target) override;
+    /// Error 445: no control on this host asks for it yet.
+    frame::FileOperationResult Run(const frame::FileOperation& operation) override;
+
+  private:
+    posix::Opener opener_;
+};
+
+}  // namespace tessel::qt

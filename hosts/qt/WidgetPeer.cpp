@@ -1,0 +1,36 @@
+#include "hosts/qt/WidgetPeer.h"
+
+#include "frame/Control.h"
+#include "frame/child/Label.h"
+#include "hosts/qt/Convert.h"
+#include "hosts/qt/LabelPeer.h"
+#include "hosts/qt/Site.h"
+
+namespace tessel::qt {
+
+WidgetPeer::WidgetPeer(frame::ChildControl& child, QWidget* widget) : child_(child), widget_(widget) {
+    widget->setParent(static_cast<Site*>(child.Owner().Site())->surface());
+    widget->setObjectName(ToQt(child.Name()));
+    widget->show();
+}
+
+WidgetPeer::~WidgetPeer() {
+    if (!widget_) return;
+    widget_->hide();
+    widget_->deleteLater();
+}
+
+void WidgetPeer::FollowChild() {
+    if (!widget_) return;
+    widget_->setGeometry(PixelRect(child_.Left(), child_.Top(), child_.Width(), child_.Height()));
+    widget_->setVisible(child_.Visible());
+    widget_->setEnabled(child_.Enabled());
+    widget_->setToolTip(ToQt(child_.ToolTipText()));
+}
+
+std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl& child) {
+    if (auto* label = dynamic_cast<child::Label*>(&child)) return std::make_unique<LabelPeer>(*label);
+    return nullptr;
+}
+
+}  // namespace tessel::qt
