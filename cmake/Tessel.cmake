@@ -125,3 +125,29 @@ function(tessel_fuzzer name)
     add_test(NAME ${name} COMMAND ${name}
         -seed=1 -runs=100000 -max_total_time=30 -timeout=10 -verbosity=0 -print_final_stats=1 ${corpus} ${seeds})
 endfunction()
+
+# tessel_tests_on_qt(link_on_qt_tests DEPENDS tessel_controls_link)
+# The tests of the folder once more, on the host for Qt.
+function(tessel_tests_on_qt name)
+    if(NOT TESSEL_QT)
+        return()
+    endif()
+    cmake_parse_arguments(ARG "" "" "DEPENDS" ${ARGN})
+    file(GLOB sources CONFIGURE_DEPENDS *_test.cpp)
+    tessel_qt_test(${name} SOURCES ${sources} DEPENDS ${ARG_DEPENDS} tessel_headless)
+    target_compile_definitions(${name} PRIVATE TESSEL_TESTED_ON_QT)
+endfunction()
+
+# tessel_qt_test(qt_tests SOURCES a_test.cpp DEPENDS tessel_headless)
+# A test program with widgets. They are shown on no screen, and nothing of the user's is read or written.
+function(tessel_qt_test name)
+    cmake_parse_arguments(ARG "" "" "SOURCES;DEPENDS" ${ARGN})
+    tessel_program(${name} SOURCES ${ARG_SOURCES} ${PROJECT_SOURCE_DIR}/tests/hosts/qt/main.cpp
+        DEPENDS ${ARG_DEPENDS} tessel_qt GTest::gmock)
+    add_test(NAME ${name} COMMAND ${name})
+    set(home ${CMAKE_CURRENT_BINARY_DIR}/${name}_home)
+    file(MAKE_DIRECTORY ${home})
+    file(CHMOD ${home} PERMISSIONS OWNER_READ OWNER_WRITE OWNER_EXECUTE)
+    set_tests_properties(${name} PROPERTIES ENVIRONMENT
+        "QT_QPA_PLATFORM=offscreen;HOME=${home};XDG_CONFIG_HOME=${home};XDG_DATA_HOME=${home};XDG_CACHE_HOME=${home};XDG_RUNTIME_DIR=${home};TZ=UTC;LC_ALL=C.UTF-8")
+endfunction()

@@ -46,19 +46,12 @@ class HeadlessSite::LoggingSink final : public frame::EventSink {
         return site_.logEvents_ || site_.onEvent_ || site_.handlers_.Wants(event);
     }
     void Raise(const frame::EventInfo& event, frame::EventArguments arguments) override {
-        if (site_.logEvents_) Write(event, arguments);
+        if (site_.logEvents_) site_.headless_.log.AddEvent(site_.name_, event, arguments);
         if (site_.onEvent_) site_.onEvent_(site_.name_, event, arguments);
         if (site_.handlers_.Wants(event)) site_.handlers_.Raise(event, arguments);
     }
 
   private:
-    void Write(const frame::EventInfo& event, frame::EventArguments arguments) {
-        std::vector<Variant> values;
-        values.reserve(arguments.size());
-        for (const frame::EventArgument& argument : arguments) values.push_back(argument.Get());
-        site_.headless_.log.Add({"event", site_.name_, event.name, ListOf(std::move(values))});
-    }
-
     HeadlessSite& site_;
 };
 

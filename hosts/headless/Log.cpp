@@ -7,6 +7,13 @@ namespace tessel::headless {
 
 using frame::Variant;
 
+void Log::AddEvent(std::string_view object, const frame::EventInfo& event, frame::EventArguments arguments) {
+    std::vector<Variant> values;
+    values.reserve(arguments.size());
+    for (const frame::EventArgument& argument : arguments) values.push_back(argument.Get());
+    Add({"event", object, event.name, ListOf(std::move(values))});
+}
+
 std::string Log::EventNames(std::string_view object) const {
     std::string names;
     for (const Entry& entry : entries_) {

@@ -5,6 +5,7 @@
 #include <utility>
 #include <vector>
 
+#include "frame/Event.h"
 #include "frame/Variant.h"
 
 namespace tessel::headless {
@@ -16,6 +17,8 @@ class Log {
     using Entry = std::vector<frame::Variant>;
 
     void Add(Entry entry) { entries_.push_back(std::move(entry)); }
+    /// An event of an object with its arguments as they stand.
+    void AddEvent(std::string_view object, const frame::EventInfo& event, frame::EventArguments arguments);
     const std::vector<Entry>& Entries() const { return entries_; }
     std::vector<Entry> Take() { return std::exchange(entries_, {}); }
     void Clear() { entries_.clear(); }

@@ -37,6 +37,8 @@ class ControlWidget : public QWidget {
     QByteArray bag() const;
     /// A control that was in use already is replaced by a fresh one that is loaded.
     void setBag(const QByteArray& bag);
+    /// The same from saved state in a form of the program's own.
+    void load(const frame::PropertyBag& saved) { place(&saved); }
 
     /// The size of the control; `preferredSize` for one in a layout that does not size itself.
     QSize sizeHint() const override;

@@ -10,7 +10,7 @@
 #include <vector>
 
 #include "controls/link/Link.h"
-#include "hosts/headless/HeadlessHost.h"
+#include "tests/HostUnderTest.h"
 #include "tests/controls/link/LinkTestHelp.h"
 
 /// What an application may do to a link from inside the link's own events.
@@ -21,7 +21,7 @@ using frame::ControlError;
 using frame::Font;
 using frame::OLE_COLOR;
 using frame::Variant;
-using headless::HeadlessHost;
+using test::HostUnderTest;
 using testing::ElementsAre;
 using testing::EndsWith;
 using testing::IsEmpty;
@@ -97,7 +97,7 @@ class LinkHandlers : public testing::TestWithParam<Input> {
         for (const Input& input : {click, dblClick, mouseMove, mouseUp}) input.send(target);
     }
 
-    HeadlessHost host;
+    HostUnderTest host;
 
   private:
     Link* link_ = &NewLink(host);
@@ -352,7 +352,7 @@ TEST_P(LinkHandlers, HandlerOfOneLinkMayDestroyAllOthers) {
 // The reaction of a link that its handler has destroyed.
 
 TEST(LinkReaction, PressOfADestroyedLinkShowsItsFailure) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     link.SetLinkTo("a.txt");
     host.shell.executeResults = {2};
@@ -362,7 +362,7 @@ TEST(LinkReaction, PressOfADestroyedLinkShowsItsFailure) {
 }
 
 TEST(LinkReaction, PressOfADestroyedLinkStillTakesItsCaptionAndItsAction) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     link.SetCaption("www.example.org");
     Hear<frame::stock::MouseDown>(host.SiteOf(link)->ApplicationHandlers(), [&] {
@@ -374,7 +374,7 @@ TEST(LinkReaction, PressOfADestroyedLinkStillTakesItsCaptionAndItsAction) {
 }
 
 TEST(LinkReaction, MoveOfADestroyedLinkStillColoursItsText) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     Hear<frame::stock::MouseMove>(host.SiteOf(link)->ApplicationHandlers(), [&] { host.Destroy(link); });
     // The entry keeps the link until its colour has been seen.
@@ -389,7 +389,7 @@ TEST(LinkReaction, MoveOfADestroyedLinkStillColoursItsText) {
 }
 
 TEST(LinkReaction, InputToADestroyedLinkRaisesNothing) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     link.SetLinkTo("a.txt");
     frame::Entry::Run(

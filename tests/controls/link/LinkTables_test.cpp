@@ -9,7 +9,7 @@
 
 #include "controls/link/Link.h"
 #include "frame/ClassTable.h"
-#include "hosts/headless/HeadlessHost.h"
+#include "tests/HostUnderTest.h"
 #include "tests/controls/link/LinkTestHelp.h"
 
 namespace tessel::controls {
@@ -21,7 +21,7 @@ using frame::MemoryBag;
 using frame::OLE_COLOR;
 using frame::Variant;
 using frame::VarType;
-using headless::HeadlessHost;
+using test::HostUnderTest;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::UnorderedElementsAre;
@@ -99,7 +99,7 @@ TEST(LinkTables, ClickActionsAreThreeNamedNumbers) {
 }
 
 TEST(LinkTables, AMemberAnswersByNameInAnyCaseAndByNumber) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     link.Put(-518, "Home");
     link.Put("forecolor", OLE_COLOR(0x123456));
@@ -113,7 +113,7 @@ TEST(LinkTables, AMemberAnswersByNameInAnyCaseAndByNumber) {
 }
 
 TEST(LinkTables, TheStockNumbersOfTheColoursAndOfTextAreNotTheLinks) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     for (const int number : {frame::dispatch::backColor, frame::dispatch::foreColor, frame::dispatch::text, 0, 2, 20}) {
         try {
@@ -126,7 +126,7 @@ TEST(LinkTables, TheStockNumbersOfTheColoursAndOfTextAreNotTheLinks) {
 }
 
 TEST(LinkTables, OpenLinkByNumberTakesItsTargetAndGivesTheMessage) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     host.shell.executeResults = {33, 2};
     std::vector<Variant> target = {"a.txt"};
@@ -137,7 +137,7 @@ TEST(LinkTables, OpenLinkByNumberTakesItsTargetAndGivesTheMessage) {
 }
 
 TEST(LinkTables, TheLabelIsReachedByItsName) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     EXPECT_EQ(link.Inner("Label1").Get(), &link.Label1);
     EXPECT_EQ(link.Label1.Path(), "Link1.Label1");
@@ -198,7 +198,7 @@ const std::vector<std::string> defaultLines = {
     "ClickAction Integer 1"};
 
 TEST(LinkTables, LoadAsksForEveryKeyInItsOrderWithItsDefault) {
-    HeadlessHost host;
+    HostUnderTest host;
     const AskedBag bag;
     LoadedLink(host, bag);
     std::vector<std::string> lines;
@@ -207,7 +207,7 @@ TEST(LinkTables, LoadAsksForEveryKeyInItsOrderWithItsDefault) {
 }
 
 TEST(LinkTables, SaveHandsOverEveryKeyInTheSameOrderWithTheSameDefault) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     std::vector<std::string> lines;
     const MemoryBag bag = host.Save(link);
@@ -216,7 +216,7 @@ TEST(LinkTables, SaveHandsOverEveryKeyInTheSameOrderWithTheSameDefault) {
 }
 
 TEST(LinkTables, TheDefaultOfTheFontIsTheAmbientFont) {
-    HeadlessHost host;
+    HostUnderTest host;
     const auto ambient = std::make_shared<Font>("Courier", 20);
     const AskedBag asked;
     auto& link = host.Create<Link>("Link1", {.saved = &asked, .ambientFont = ambient});
@@ -226,7 +226,7 @@ TEST(LinkTables, TheDefaultOfTheFontIsTheAmbientFont) {
 }
 
 TEST(LinkTables, SavedValuesHaveTheTypesOfTheirPlaces) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     std::vector<std::string> lines;
     const MemoryBag bag = host.Save(link);
@@ -239,7 +239,7 @@ TEST(LinkTables, SavedValuesHaveTheTypesOfTheirPlaces) {
 }
 
 TEST(LinkTables, ALinkPlacedNewAndSavedAtOnceHandsOverItsDefaults) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     const MemoryBag bag = host.Save(link);
     for (const auto& write : bag.Written()) EXPECT_EQ(write.value, write.otherwise) << write.key;
@@ -247,7 +247,7 @@ TEST(LinkTables, ALinkPlacedNewAndSavedAtOnceHandsOverItsDefaults) {
 }
 
 TEST(LinkTables, ALinkLoadedFromAnEmptyBagEqualsANewOne) {
-    HeadlessHost host;
+    HostUnderTest host;
     const MemoryBag nothing;
     auto& placed = NewLink(host);
     auto& loaded = host.Create<Link>("Link2", {.saved = &nothing, .width = width, .height = height});
@@ -282,7 +282,7 @@ MemoryBag::Contents OtherValues() {
 std::string PropertyOf(const std::string& key) { return key == "Forecolor" ? "ForeColor" : key; }
 
 TEST(LinkTables, EachKeyByItselfComesThroughLoadAndSave) {
-    HeadlessHost host;
+    HostUnderTest host;
     for (const auto& [key, value] : OtherValues()) {
         const MemoryBag saved({{key, value}});
         auto& link = LoadedLink(host, saved);
@@ -296,7 +296,7 @@ TEST(LinkTables, EachKeyByItselfComesThroughLoadAndSave) {
 }
 
 TEST(LinkTables, AllKeysTogetherComeThroughSetSaveAndLoad) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     for (const auto& [key, value] : OtherValues()) link.Put(PropertyOf(key), value);
     const MemoryBag saved = host.Save(link);
@@ -308,7 +308,7 @@ TEST(LinkTables, AllKeysTogetherComeThroughSetSaveAndLoad) {
 
 TEST(LinkTables, EachSetterReportsItsKeyOnce) {
     for (const bool designTime : {true, false}) {
-        HeadlessHost host;
+        HostUnderTest host;
         auto& link = host.Create<Link>("Link1", {.designTime = designTime});
         std::vector<std::string> reported;
         for (const auto& [key, value] : OtherValues()) {
@@ -322,7 +322,7 @@ TEST(LinkTables, EachSetterReportsItsKeyOnce) {
 }
 
 TEST(LinkTables, ASetterReportsAValueThatIsTheSameToo) {
-    HeadlessHost host;
+    HostUnderTest host;
     auto& link = NewLink(host);
     host.log.Clear();
     for (const auto& key : keys) link.Put(PropertyOf(key), link.Get(PropertyOf(key)));
@@ -330,7 +330,7 @@ TEST(LinkTables, ASetterReportsAValueThatIsTheSameToo) {
 }
 
 TEST(LinkTables, ALoadReportsNothing) {
-    HeadlessHost host;
+    HostUnderTest host;
     const MemoryBag saved(OtherValues());
     LoadedLink(host, saved);
     EXPECT_THAT(Changes(host), IsEmpty());
@@ -338,7 +338,7 @@ TEST(LinkTables, ALoadReportsNothing) {
 }
 
 TEST(LinkTables, KeysAreCaseSensitive) {
-    HeadlessHost host;
+    HostUnderTest host;
     const MemoryBag saved({{"ForeColor", OLE_COLOR(1)}, {"forecolor", OLE_COLOR(2)}, {"caption", "no"}, {"LINKTO", "no"}});
     auto& link = LoadedLink(host, saved);
     EXPECT_EQ(link.ForeColor(), blue);
@@ -347,7 +347,7 @@ TEST(LinkTables, KeysAreCaseSensitive) {
 }
 
 TEST(LinkTables, KeysOfOtherTypesAreConvertedOnLoad) {
-    HeadlessHost host;
+    HostUnderTest host;
     const MemoryBag saved({{"BackColor", "255"},
                            {"Enabled", "False"},
                            {"Alignment", 2.0},
@@ -374,7 +374,7 @@ TEST(LinkTables, KeysOfOtherTypesAreConvertedOnLoad) {
 }
 
 /// The number of the error with which a load fails; 0 when it succeeds.
-int LoadError(HeadlessHost& host, const std::string& key, const Variant& value) {
+int LoadError(HostUnderTest& host, const std::string& key, const Variant& value) {
     const MemoryBag saved({{key, value}});
     try {
         LoadedLink(host, saved);
@@ -385,7 +385,7 @@ int LoadError(HeadlessHost& host, const std::string& key, const Variant& value) 
 }
 
 TEST(LinkTables, AValueThatDoesNotConvertFailsTheLoadAndLeavesNoControlBehind) {
-    HeadlessHost host;
+    HostUnderTest host;
     for (const auto* key : {"BackColor", "Enabled", "BorderStyle", "Alignment", "Appearance", "AutoSize", "WordWrap",
                             "HighlightColor", "UsedColor", "Forecolor", "BorderSize", "SuppressMessages", "ClickAction"}) {
         EXPECT_EQ(LoadError(host, key, "wide"), frame::errors::typeMismatch) << key;
@@ -396,7 +396,7 @@ TEST(LinkTables, AValueThatDoesNotConvertFailsTheLoadAndLeavesNoControlBehind) {
 }
 
 TEST(LinkTables, ATextThatIsAnArrayFailsTheLoad) {
-    HeadlessHost host;
+    HostUnderTest host;
     for (const auto* key : {"Caption", "LinkTo"}) {
         EXPECT_EQ(LoadError(host, key, headless::ListOf(std::vector<std::string>{"a"})), frame::errors::typeMismatch) << key;
         EXPECT_EQ(host.FindSite("Link1"), nullptr) << key;
@@ -404,7 +404,7 @@ TEST(LinkTables, ATextThatIsAnArrayFailsTheLoad) {
 }
 
 TEST(LinkTables, ANumberThatDoesNotFitFailsTheLoadWithOverflow) {
-    HeadlessHost host;
+    HostUnderTest host;
     for (const auto* key : {"BorderStyle", "Alignment", "Appearance", "ClickAction"}) {
         EXPECT_EQ(LoadError(host, key, 70'000), frame::errors::overflow) << key;
         EXPECT_EQ(host.FindSite("Link1"), nullptr) << key;
@@ -412,14 +412,14 @@ TEST(LinkTables, ANumberThatDoesNotFitFailsTheLoadWithOverflow) {
 }
 
 TEST(LinkTables, AFontThatIsNoFontFailsTheLoad) {
-    HeadlessHost host;
+    HostUnderTest host;
     EXPECT_NE(LoadError(host, "Font", "Courier"), 0);
     EXPECT_EQ(LoadError(host, "Font", frame::ObjectRef(host.Form())), frame::errors::typeMismatch);
     EXPECT_EQ(host.Form().Count(), 0);
 }
 
 TEST(LinkTables, AFailedLoadDoesNotHinderTheNextOfTheSameName) {
-    HeadlessHost host;
+    HostUnderTest host;
     EXPECT_EQ(LoadError(host, "BorderSize", "wide"), frame::errors::typeMismatch);
     EXPECT_EQ(LoadError(host, "BorderSize", 5), 0);
     ASSERT_NE(host.FindSite("Link1"), nullptr);
@@ -427,7 +427,7 @@ TEST(LinkTables, AFailedLoadDoesNotHinderTheNextOfTheSameName) {
 }
 
 TEST(LinkTables, AnUnnamedClickActionIsKeptByTheBag) {
-    HeadlessHost host;
+    HostUnderTest host;
     for (const std::int16_t action : {std::int16_t{3}, std::int16_t{-1}, std::int16_t{32767}}) {
         const MemoryBag saved({{"ClickAction", action}});
         auto& link = LoadedLink(host, saved);

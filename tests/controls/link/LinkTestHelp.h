@@ -9,7 +9,7 @@
 #include <vector>
 
 #include "controls/link/Link.h"
-#include "hosts/headless/HeadlessHost.h"
+#include "tests/HostUnderTest.h"
 
 /// What the tests of the link share. All links are 2000 twips wide and 600 high, unless a test says otherwise.
 namespace tessel::controls::linktest {
@@ -18,11 +18,11 @@ inline constexpr frame::OLE_COLOR blue = 0xC00000, red = 0x0000C0, purple = 0x80
 inline constexpr std::int16_t leftButton = 1, rightButton = 2, middleButton = 4, noShift = 0;
 inline constexpr float width = 2000, height = 600;
 
-inline Link& NewLink(headless::HeadlessHost& host, const std::string& name = "Link1") {
+inline Link& NewLink(test::HostUnderTest& host, const std::string& name = "Link1") {
     return host.Create<Link>(name, {.width = width, .height = height});
 }
 
-inline Link& LoadedLink(headless::HeadlessHost& host, const frame::PropertyBag& saved) {
+inline Link& LoadedLink(test::HostUnderTest& host, const frame::PropertyBag& saved) {
     return host.Create<Link>("Link1", {.saved = &saved, .width = width, .height = height});
 }
 
@@ -60,18 +60,18 @@ inline std::vector<std::string> Told(const headless::Log& log, std::string_view 
     for (const auto& entry : log.Of(kind)) lines.push_back(entry.at(first).ToText());
     return lines;
 }
-inline std::vector<std::string> Changes(const headless::HeadlessHost& host) { return Told(host.log, "changed", 2); }
-inline std::vector<std::string> Boxes(const headless::HeadlessHost& host) { return Told(host.log, "msgbox", 1); }
+inline std::vector<std::string> Changes(const test::HostUnderTest& host) { return Told(host.log, "changed", 2); }
+inline std::vector<std::string> Boxes(const test::HostUnderTest& host) { return Told(host.log, "msgbox", 1); }
 
 /// What the shell was asked for: "open a.txt".
-inline std::vector<std::string> Requests(const headless::HeadlessHost& host) {
+inline std::vector<std::string> Requests(const test::HostUnderTest& host) {
     std::vector<std::string> lines;
     for (const auto& entry : host.log.Of("execute")) lines.push_back(entry.at(1).ToText() + " " + entry.at(2).ToText());
     return lines;
 }
 
 /// The arguments of the last event, as text: "1 0 1000 300".
-inline std::string LastArguments(const headless::HeadlessHost& host) {
+inline std::string LastArguments(const test::HostUnderTest& host) {
     std::string line;
     for (const auto& value : host.log.Of("event").back().at(3).ToArray().items) line += (line.empty() ? "" : " ") + value.ToText();
     return line;

@@ -1,0 +1,11 @@
+#include <gmock/gmock.h>
+
+#include <QApplication>
+
+/// Tests with widgets.
+int main(int count, char** arguments) {
+    testing::InitGoogleMock(&count, arguments);
+    QApplication program(count, arguments);
+    QApplication::setStyle("Fusion");
+    return RUN_ALL_TESTS();
+}
