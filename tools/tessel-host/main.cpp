@@ -5,9 +5,23 @@
 #include "tools/tessel-host/Lines.h"
 #include "tools/tessel-host/Session.h"
 
+#ifdef _WIN32
+#include <fcntl.h>
+#include <io.h>
+#include <stdio.h>
+#endif
+
 namespace {
 
 constexpr int usageError = 2;
+
+/// Where the system would change line ends, and end the input at a control character: every byte as it stands.
+void KeepEveryByte() {
+#ifdef _WIN32
+    _setmode(_fileno(stdin), _O_BINARY);
+    _setmode(_fileno(stdout), _O_BINARY);
+#endif
+}
 
 int Run(std::istream& input) {
     using tessel::tools::LineRead;
@@ -25,6 +39,7 @@ int Run(std::istream& input) {
 
 /// tessel-host [file]: reads requests, one JSON object a line, from the file or from standard input.
 int main(int count, char** arguments) {
+    KeepEveryByte();
     std::ios::sync_with_stdio(false);
     if (count > 2 || (count == 2 && arguments[1][0] == '-')) {
         std::cerr << "usage: tessel-host [file]\n";

@@ -1,6 +1,6 @@
 """The pages in docs/reference are just what tessel-reference makes of the class tables.
 
-usage: reference_test.py tessel-reference docs/reference
+usage: reference_test.py [emulator...] tessel-reference docs/reference
 """
 
 import pathlib
@@ -14,9 +14,9 @@ def pages(folder):
 
 
 def main():
-    program, kept = sys.argv[1:]
+    *program, kept = sys.argv[1:]
     with tempfile.TemporaryDirectory() as folder:
-        subprocess.run([program, folder], check=True)
+        subprocess.run([*program, folder], check=True)
         made = pages(folder)
     if not made:
         sys.exit("tessel-reference made no page")

@@ -1,4 +1,5 @@
-"""Drives the built program as a script does: script_test.py PROGRAM. Exit code 1 when a claim does not hold."""
+"""Drives the built program as a script does: script_test.py PROGRAM, or
+script_test.py EMULATOR... PROGRAM. Exit code 1 when a claim does not hold."""
 import json
 import os
 import re
@@ -8,7 +9,7 @@ import tempfile
 import time
 import traceback
 
-PROGRAM = sys.argv[1]
+PROGRAM = sys.argv[1:]
 MANUAL = os.path.join(os.path.dirname(os.path.abspath(__file__)), "..", "..", "..", "docs", "tessel-host.md")
 MEBIBYTE = 1 << 20
 LINK = '{"do":"create","class":"Link","name":"Link1","mode":"run","bag":{"Caption":"Docs","LinkTo":"a.txt"}}'
@@ -19,7 +20,7 @@ def run(data, *arguments, seconds=60):
     """The exit code, the output and the error output of one run on `data`."""
     if isinstance(data, str):
         data = data.encode()
-    done = subprocess.run([PROGRAM, *arguments], input=data, stdout=subprocess.PIPE, stderr=subprocess.PIPE, timeout=seconds)
+    done = subprocess.run([*PROGRAM, *arguments], input=data, stdout=subprocess.PIPE, stderr=subprocess.PIPE, timeout=seconds)
     return done.returncode, done.stdout, done.stderr
 
 
@@ -240,7 +241,7 @@ def test_the_end_of_the_input_ends_the_program_with_code_0():
 
 
 def test_each_reply_comes_before_the_next_request_is_read():
-    with subprocess.Popen([PROGRAM], stdin=subprocess.PIPE, stdout=subprocess.PIPE, text=True) as program:
+    with subprocess.Popen(PROGRAM, stdin=subprocess.PIPE, stdout=subprocess.PIPE, text=True) as program:
         for line in (LINK, CLICK):
             program.stdin.write(line + "\n")
             program.stdin.flush()
