@@ -1,6 +1,7 @@
-# Installs the build into an empty folder, moves that folder, and builds and runs a program that knows nothing but where the
+# Installs the build into an empty folder, moves that folder, and builds and runs programs that know nothing but where the
 # folder is now.
-#   cmake -D BUILD=folder -D CONFIG=Release -D SCRATCH=folder -D SOURCE=folder -D GENERATOR=Ninja -D COMPILER=g++ -P <this>
+#   cmake -D BUILD=folder -D CONFIG=Release -D SCRATCH=folder -D SOURCE=folder -D GENERATOR=Ninja -D COMPILER=g++
+#     -D QT=ON -P <this>
 cmake_minimum_required(VERSION 3.25)
 
 function(expect_equal what expected found)
@@ -32,12 +33,21 @@ foreach(file IN LISTS package_files)
     endforeach()
 endforeach()
 
-set(program_build ${SCRATCH}/headless)
-execute_process(
-    COMMAND ${CMAKE_COMMAND} -S ${CMAKE_CURRENT_LIST_DIR}/consumer/headless -B ${program_build} -G ${GENERATOR}
-        -D CMAKE_CXX_COMPILER=${COMPILER} -D CMAKE_BUILD_TYPE=${CONFIG} -D CMAKE_PREFIX_PATH=${prefix}
-        -D CMAKE_RUNTIME_OUTPUT_DIRECTORY=${program_build}/$<0:>
-    COMMAND_ERROR_IS_FATAL ANY)
-execute_process(COMMAND ${CMAKE_COMMAND} --build ${program_build} --config "${CONFIG}" COMMAND_ERROR_IS_FATAL ANY)
-execute_process(COMMAND ${program_build}/headless_consumer OUTPUT_VARIABLE said COMMAND_ERROR_IS_FATAL ANY)
-expect_equal("the program's output" "open manual.txt\nLink\n" "${said}")
+# Builds the program of a folder and expects what it says; further arguments go to CMake.
+function(try_consumer name expected)
+    set(program_build ${SCRATCH}/${name})
+    execute_process(
+        COMMAND ${CMAKE_COMMAND} -S ${CMAKE_CURRENT_LIST_DIR}/consumer/${name} -B ${program_build} -G ${GENERATOR}
+            -D CMAKE_CXX_COMPILER=${COMPILER} -D CMAKE_BUILD_TYPE=${CONFIG} -D CMAKE_PREFIX_PATH=${prefix}
+            -D CMAKE_RUNTIME_OUTPUT_DIRECTORY=${program_build}/$<0:> ${ARGN}
+        COMMAND_ERROR_IS_FATAL ANY)
+    execute_process(COMMAND ${CMAKE_COMMAND} --build ${program_build} --config "${CONFIG}" COMMAND_ERROR_IS_FATAL ANY)
+    execute_process(COMMAND ${program_build}/${name}_consumer OUTPUT_VARIABLE said COMMAND_ERROR_IS_FATAL ANY)
+    expect_equal("what the program of ${name} says" "${expected}" "${said}")
+endfunction()
+
+try_consumer(headless "open manual.txt\nLink\n" -D CMAKE_DISABLE_FIND_PACKAGE_Qt6=ON)
+if(QT)
+    set(ENV{QT_QPA_PLATFORM} offscreen)
+    try_consumer(qt "pressed with button 1\nUnable to find file\n")
+endif()
