@@ -17,7 +17,7 @@
 #include "frame/ClassTable.h"
 #include "frame/Control.h"
 #include "frame/Text.h"
-#include "hosts/headless/HeadlessHost.h"
+#include "tests/HostUnderTest.h"
 #include "tests/frame/TestControl.h"
 
 /// What holds for every class of controls and every row of its table, and for the parts that are reached through it.
@@ -31,9 +31,9 @@ using frame::Member;
 using frame::Object;
 using frame::Variant;
 using frame::VarType;
-using headless::HeadlessHost;
 using headless::Placing;
 using test::ErrorOf;
+using test::HostUnderTest;
 
 /// An object of the library and where it stands: "Link", "Link.Label1".
 struct Place {
@@ -68,7 +68,7 @@ class Sweep : public testing::TestWithParam<ControlClass> {
                 visit(place.path + "." + std::string(member.name), *place.object, member);
     }
 
-    HeadlessHost host;
+    HostUnderTest host;
 };
 
 template <class Rows, class NameOf>
@@ -449,7 +449,7 @@ TEST(ControlClasses, AreFoundByNameInAnyCase) {
 }
 
 TEST(ControlClasses, MakeControlsOfTheirTable) {
-    HeadlessHost host;
+    HostUnderTest host;
     for (const ControlClass& controlClass : ControlClasses())
         EXPECT_EQ(&host.Create(controlClass, "Made1").Table(), controlClass.table);
 }

@@ -8,8 +8,8 @@
 #include <utility>
 #include <vector>
 
-#include "frame/Text.h"
 #include "controls/Classes.h"
+#include "frame/Text.h"
 #include "hosts/headless/HeadlessHost.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/Form.h"
@@ -102,7 +102,8 @@ class QtTestHost {
     C& Create(const std::string& name, const headless::Placing& placing = {}) {
         return static_cast<C&>(Create(*FindClass<C>(), name, placing));
     }
-    frame::Control& Create(const frame::ControlClass& controlClass, const std::string& name, const headless::Placing& placing = {}) {
+    frame::Control& Create(const frame::ControlClass& controlClass, const std::string& name,
+                           const headless::Placing& placing = {}) {
         const std::size_t reports = errors.reports.size();
         host_->setUserMode(!placing.designTime);
         form_->setFont(FormFont(placing.ambientFont ? placing.ambientFont : std::make_shared<frame::Font>()));
