@@ -170,9 +170,10 @@ void ControlWidget::setBag(const QByteArray& bag) {
 
 // Size and place.
 
+// A designer asks before it has loaded the control, which must not be settled by that.
 QSize ControlWidget::sizeHint() const {
-    settle();
     const QSize own = PixelRect(0, 0, site_->Width(), site_->Height()).size();
+    if (!settled_) return own;
     const QSize preferred = sizesItself() ? own : preferredSize();
     return preferred.isValid() ? preferred : own;
 }

@@ -47,6 +47,9 @@ class ControlWidget : public QWidget {
     /// `controlClass` makes the control.
     ControlWidget(const frame::ControlClass& controlClass, QWidget* parent);
 
+    /// Whether it is decided how the control came.
+    bool isSettled() const { return settled_; }
+
     // What generated classes are made of.
     QVariant get(const char* member) const;
     void put(const char* member, const QVariant& value);

@@ -77,12 +77,12 @@ QSize LinkWidget::textSize(std::optional<float> wrapWidth) const {
 QSize LinkWidget::preferredSize() const { return textSize({}); }
 
 QSize LinkWidget::minimumSizeHint() const {
-    if (sizesItself()) return sizeHint();
+    if (!isSettled() || sizesItself()) return sizeHint();
     constexpr int least = 16;
     return {least, textSize({}).height()};
 }
 
-bool LinkWidget::hasHeightForWidth() const { return link().WordWrap(); }
+bool LinkWidget::hasHeightForWidth() const { return isSettled() && link().WordWrap(); }
 
 int LinkWidget::heightForWidth(int width) const { return textSize(Twips(width)).height(); }
 
