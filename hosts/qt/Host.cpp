@@ -99,8 +99,13 @@ Host::Host(const frame::Services& replaced) : d(std::make_unique<Private>(*this)
 Host::~Host() = default;
 
 std::shared_ptr<Host> Host::make(const frame::Services& replaced) {
-    // The last one who lets go may stand inside a call of this host.
-    return {new Host(replaced), [](Host* host) { host->deleteLater(); }};
+    // The last one who lets go may stand inside a call of this host; where the application ends no call is left.
+    return {new Host(replaced), [](Host* host) {
+                if (QCoreApplication::closingDown())
+                    delete host;
+                else
+                    host->deleteLater();
+            }};
 }
 
 std::shared_ptr<Host> Host::of(const QWidget* widget) {
