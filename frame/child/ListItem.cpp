@@ -40,6 +40,8 @@ std::string ListItem::Text() const { return Rows().Text(row_.row, 0); }
 void ListItem::SetText(const std::string& value) { Rows().SetText(row_.row, 0, value); }
 std::string ListItem::SubItems(std::int32_t index) const { return Rows().Text(row_.row, Column(index)); }
 void ListItem::SetSubItems(std::int32_t index, const std::string& value) { Rows().SetText(row_.row, Column(index), value); }
+std::string ListItem::Key() const { return Rows().Key(row_.row); }
+Status ListItem::SetKey(const std::string& value) { return Rows().SetKey(row_.row, value); }
 std::int32_t ListItem::Index() const { return IndexOf(Rows().PositionOf(row_.row)); }
 Variant ListItem::Tag() const { return Rows().Tag(row_.row); }
 void ListItem::SetTag(const Variant& value) { Rows().SetTag(row_.row, value); }
@@ -53,10 +55,8 @@ Variant ListItem::SmallIcon() const { return Rows().Icon(row_.row, IconSize::Sma
 Status ListItem::SetSmallIcon(const Variant& value) { return Rows().SetIcon(row_.row, IconSize::Small, value); }
 float ListItem::Top() const { return List().RowTop(Rows().PositionOf(row_.row)); }
 
-float ListItem::Height() const {
-    List();
-    return ListView::rowHeightTwips;
-}
+float ListItem::Height() const { return List().RowHeight(Rows().PositionOf(row_.row)); }
+void ListItem::EnsureVisible() const { List().EnsureVisible(Rows().PositionOf(row_.row)); }
 
 std::string ListItem::Path() const {
     const ListView* list = list_.Get();
@@ -71,14 +71,25 @@ bool ListItem::EqualsObject(const frame::Object& other) const {
 
 std::int32_t ListItems::Count() const { return static_cast<std::int32_t>(list_.Rows().Count()); }
 
-std::int32_t ListItems::Add(const std::string& text) {
+std::int32_t ListItems::Add(const std::string& text, const std::optional<std::string>& key, std::optional<std::int32_t> index) {
     ListRows& rows = list_.Rows();
-    return IndexOf(rows.PositionOf(rows.Add(text)));
+    if (key && rows.FindKey(*key)) throw ControlError(errors::keyNotUnique);
+    if (index && (*index < 1 || *index > Count() + 1)) throw ControlError(errors::indexOutOfBounds);
+    const RowId row = rows.Add(text, index ? std::optional(static_cast<ListRows::Position>(*index - 1)) : std::nullopt);
+    if (key) rows.SetKey(row, *key).Check();
+    return IndexOf(rows.PositionOf(row));
 }
 
-ListItemRef ListItems::Item(std::int32_t index) const { return list_.ItemOf(At(index)); }
-void ListItems::Remove(std::int32_t index) { list_.Rows().Remove(At(index)); }
+ListItemRef ListItems::Item(const Variant& indexOrKey) const { return list_.ItemOf(RowOf(indexOrKey)); }
+void ListItems::Remove(const Variant& indexOrKey) { list_.Rows().Remove(RowOf(indexOrKey)); }
 void ListItems::Clear() { list_.Rows().Clear(); }
+
+RowId ListItems::RowOf(const Variant& indexOrKey) const {
+    if (!indexOrKey.IsString()) return At(indexOrKey.ToLong());
+    const auto row = list_.Rows().FindKey(indexOrKey.Text());
+    if (!row) throw ControlError(errors::elementNotFound);
+    return *row;
+}
 
 RowId ListItems::At(std::int32_t index) const {
     if (index < 1 || index > Count()) throw ControlError(errors::indexOutOfBounds);
@@ -92,6 +103,7 @@ namespace {
 constexpr std::array itemMembers = {
     frame::property<&ListItem::Text, &ListItem::SetText>("Text", "The text of the row."),
     frame::property<&ListItem::SubItems, &ListItem::SetSubItems>("SubItems", "The text of a further column, from 1."),
+    frame::property<&ListItem::Key, &ListItem::SetKey>("Key", "The name of the row in its list; empty for none."),
     frame::property<&ListItem::Index>("Index", "The place of the row in its list, from 1."),
     frame::property<&ListItem::Tag, &ListItem::SetTag>("Tag", "Whatever the program keeps with the row."),
     frame::property<&ListItem::Selected, &ListItem::SetSelected>("Selected", "Whether the row is selected."),
@@ -100,14 +112,15 @@ constexpr std::array itemMembers = {
     frame::property<&ListItem::SmallIcon, &ListItem::SetSmallIcon>("SmallIcon", "The key or index of the row's small image."),
     frame::property<&ListItem::Top>("Top", "Top edge in twips of the list, as it is scrolled."),
     frame::property<&ListItem::Height>("Height", "Height in twips."),
+    frame::method<&ListItem::EnsureVisible>("EnsureVisible", "Scrolls the list so that the row is in view."),
 };
 constexpr frame::ClassTable itemTable{.name = "ListItem", .members = itemMembers, .defaultMember = "Text"};
 
 constexpr std::array itemsMembers = {
     frame::property<&ListItems::Count>("Count", "The number of rows."),
-    frame::property<&ListItems::Item>("Item", "A row by its index, from 1."),
-    frame::method<&ListItems::Add>("Add", "Adds a row and gives its index.", {"Text"}),
-    frame::method<&ListItems::Remove>("Remove", "Removes the row at an index.", {"Index"}),
+    frame::property<&ListItems::Item>("Item", "A row by its index, from 1, or its key."),
+    frame::method<&ListItems::Add>("Add", "Adds a row and gives its index.", {"Text", "Key", "Index"}),
+    frame::method<&ListItems::Remove>("Remove", "Removes a row by its index or key.", {"Index"}),
     frame::method<&ListItems::Clear>("Clear", "Removes all rows."),
 };
 constexpr frame::ClassTable itemsTable{.name = "ListItems", .members = itemsMembers, .defaultMember = "Item"};

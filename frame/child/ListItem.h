@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <memory>
+#include <optional>
 #include <string>
 
 #include "frame/Object.h"
@@ -22,6 +23,9 @@ class ListItem final : public frame::Object {
     /// `index` from 1; error 380 below that and above 32767.
     std::string SubItems(std::int32_t index) const;
     void SetSubItems(std::int32_t index, const std::string& value);
+    /// Unique in its list without regard to case; empty for none. Error 35602 for a key that another row has.
+    std::string Key() const;
+    frame::Status SetKey(const std::string& value);
     /// From 1, by the order as it stands.
     std::int32_t Index() const;
     frame::Variant Tag() const;
@@ -40,6 +44,8 @@ class ListItem final : public frame::Object {
     /// In twips of the list, as the list is scrolled.
     float Top() const;
     float Height() const;
+    /// Scrolls the list just so far that the row is in view.
+    void EnsureVisible() const;
 
     RowRef Ref() const { return row_; }
     bool IsOf(const ListView& list) const;
@@ -59,16 +65,18 @@ class ListItem final : public frame::Object {
 
 using ListItemRef = std::shared_ptr<ListItem>;
 
-/// The rows of a list as a collection. An index counts from 1; error 35600 outside.
+/// The rows of a list as a collection. A row is named by its index from 1 or by its key, without regard to case: a string is
+/// always a key. Error 35600 for an index outside, 35601 for a key that is not there.
 class ListItems final : public frame::Object {
   public:
     explicit ListItems(ListView& list) : list_(list) {}
 
     std::int32_t Count() const;
-    /// Adds a row and gives its index: behind all others, or where it sorts.
-    std::int32_t Add(const std::string& text);
-    ListItemRef Item(std::int32_t index) const;
-    void Remove(std::int32_t index);
+    /// Adds a row and gives its index: where it sorts; in a list that is not sorted with the index given, from 1 to `Count` + 1, or
+    /// behind all others. Error 35600 for an index outside, 35602 for a key that is there already.
+    std::int32_t Add(const std::string& text, const std::optional<std::string>& key = {}, std::optional<std::int32_t> index = {});
+    ListItemRef Item(const frame::Variant& indexOrKey) const;
+    void Remove(const frame::Variant& indexOrKey);
     void Clear();
 
     /// The row at an index.
@@ -78,6 +86,8 @@ class ListItems final : public frame::Object {
     std::string Path() const override;
 
   private:
+    RowId RowOf(const frame::Variant& indexOrKey) const;
+
     ListView& list_;
 };
 

@@ -8,8 +8,8 @@ namespace tessel::child {
 
 using frame::Variant;
 
-RowId ListRows::Add(std::string_view text) {
-    const RowId row = AddRow(text, RowTexts::ColumnZero::Own);
+RowId ListRows::Add(std::string_view text, std::optional<Position> position) {
+    const RowId row = AddRow(text, RowTexts::ColumnZero::Own, position);
     texts_.SetText(row, 0, text);
     return row;
 }
@@ -17,24 +17,31 @@ RowId ListRows::Add(std::string_view text) {
 RowId ListRows::AddFromSource() {
     const bool needsText = index_ || (sorted_ && sortKey_ == 0);
     texts_.Begin(NextId(), RowTexts::ColumnZero::FromSource);
-    return AddRow(needsText ? Text(NextId(), 0) : std::string(), RowTexts::ColumnZero::FromSource);
+    return AddRow(needsText ? Text(NextId(), 0) : std::string(), RowTexts::ColumnZero::FromSource, {});
 }
 
-RowId ListRows::AddRow(std::string_view text, RowTexts::ColumnZero columnZero) {
+RowId ListRows::AddRow(std::string_view text, RowTexts::ColumnZero columnZero, std::optional<Position> position) {
     Settle();
-    const Position position = PlaceOfNew(sortKey_ == 0 ? text : std::string_view());
-
     const RowId row = NextId();
+    if (sorted_) {
+        RowKey key{std::string(), 0};
+        if (sortKey_ == 0) key = {std::string(text), {}};
+        if (sortKey_ == 0 && columnZero == RowTexts::ColumnZero::FromSource) key.number = texts_.SortNumber(row, 0);
+        position = PlaceOfNew(key);
+    }
+    const Position place = position.value_or(Count());
+
+    rows_.MakeRoom(row);
+    texts_.Begin(row, columnZero);
+    order_.Insert(place, row);
     if (free_.empty())
-        rows_.emplace_back();
+        ++numbers_;
     else
         free_.pop_back();
     rows_[row] = Row{};
     rows_[row].serial = ++lastSerial_;
-    texts_.Begin(row, columnZero);
-    order_.Insert(position, row);
     if (index_) index_->Add(row, text);
-    if (followed_) journal_.Inserted(position);
+    if (followed_) journal_.Inserted(place);
     changed_();
     return row;
 }
@@ -45,11 +52,12 @@ void ListRows::Fill(RowId row) {
 }
 
 void ListRows::Remove(RowId row) {
-    if (index_ && !index_->Remove(row, Text(row, 0))) DropIndex();
+    if (index_) index_->Remove(row);
     const Position position = PositionOf(row);
     order_.Remove(position);
     if (Has(row, selected)) --selectedCount_;
     if (Has(row, tagged)) tags_.erase(row);
+    DropKey(row);
     texts_.End(row);
     rows_[row] = Row{};
     free_.push_back(row);
@@ -63,7 +71,10 @@ void ListRows::Clear() {
     texts_.Clear();
     icons_.Clear();
     tags_.clear();
-    rows_.clear();
+    ofKey_.clear();
+    keys_.clear();
+    rows_.Clear();
+    numbers_ = 0;
     free_.clear();
     unsettled_.clear();
     allUnsettled_ = false;
@@ -81,10 +92,12 @@ void ListRows::SetSource(const RowSource* source) {
 }
 
 void ListRows::SetText(RowId row, int column, std::string_view text) {
-    if (column == 0 && index_ && !index_->Remove(row, Text(row, 0))) DropIndex();
-    const bool isNew = texts_.SetText(row, column, text);
-    if (column == 0 && index_) index_->Add(row, text);
-    if (isNew) TextChanged(row, column);
+    if (!texts_.SetText(row, column, text)) return;
+    if (column == 0 && index_) {
+        index_->Remove(row);
+        index_->Add(row, text);
+    }
+    TextChanged(row, column);
 }
 
 void ListRows::TextChanged(RowId row, int column) {
@@ -97,8 +110,9 @@ void ListRows::TextChanged(RowId row, int column) {
 
 std::optional<RowId> ListRows::Find(std::string_view text) const {
     if (!index_) {
-        index_ = std::make_unique<TextIndex>();
-        for (const RowId row : order_.All()) index_->Add(row, Text(row, 0));
+        auto index = std::make_unique<TextIndex>();
+        for (const RowId row : order_.All()) index->Add(row, Text(row, 0));
+        index_ = std::move(index);
     }
     std::optional<Position> first;
     index_->Candidates(text, [&](RowId row) {
@@ -109,13 +123,55 @@ std::optional<RowId> ListRows::Find(std::string_view text) const {
     return first ? std::optional(At(*first)) : std::nullopt;
 }
 
+std::string ListRows::Key(RowId row) const { return Has(row, keyed) ? keys_.find(row)->second : std::string(); }
+
+frame::Status ListRows::SetKey(RowId row, std::string_view key) {
+    const auto other = FindKey(key);
+    if (other && *other != row) return frame::errors::keyNotUnique;
+    DropKey(row);
+    if (key.empty()) return {};
+    ofKey_.emplace(key, row);
+    keys_.emplace(row, key);
+    rows_[row].flags |= keyed;
+    return {};
+}
+
+std::optional<RowId> ListRows::FindKey(std::string_view key) const {
+    const auto found = ofKey_.find(key);
+    return found != ofKey_.end() ? std::optional(found->second) : std::nullopt;
+}
+
+void ListRows::DropKey(RowId row) {
+    if (!Has(row, keyed)) return;
+    const auto known = keys_.find(row);
+    ofKey_.erase(known->second);
+    keys_.erase(known);
+    rows_[row].flags &= static_cast<std::uint8_t>(~keyed);
+}
+
 void ListRows::SetSelected(RowId row, bool value) {
     if (Selected(row) == value) return;
     selectedCount_ += value ? 1 : -1;
     SetFlag(row, selected, value);
 }
 
+void ListRows::SetSelected(RowRange range, bool value) {
+    bool isNew = false;
+    for (Position position = range.first; position < range.first + range.count; ++position) {
+        const RowId row = At(position);
+        if (Selected(row) == value) continue;
+        rows_[row].flags ^= selected;
+        selectedCount_ += value ? 1 : -1;
+        isNew = true;
+    }
+    if (!isNew) return;
+    if (followed_) journal_.Changed(range.first, range.count);
+    changed_();
+}
+
 void ListRows::ClearSelection() {
+    constexpr std::uint32_t worthOneStep = 256;
+    if (selectedCount_ > worthOneStep) return SetSelected(RowRange{0, Count()}, false);
     for (RowId row = 0; selectedCount_ > 0; ++row) SetSelected(row, false);
 }
 
@@ -164,6 +220,7 @@ void ListRows::Follow() {
 }
 
 void ListRows::Unfollow() {
+    if (!followed_) return;
     followed_ = false;
     journal_.Take();
 }

@@ -5,19 +5,21 @@
 #include <functional>
 #include <memory>
 #include <optional>
+#include <span>
 #include <string>
 #include <string_view>
 #include <unordered_map>
 #include <vector>
 
+#include "frame/Text.h"
+#include "frame/child/ListConstants.h"
 #include "frame/child/RowIcons.h"
 #include "frame/child/RowJournal.h"
 #include "frame/child/RowOrder.h"
+#include "frame/child/RowSort.h"
 #include "frame/child/RowTexts.h"
 
 namespace tessel::child {
-
-enum class ListSortOrderConstants : std::int16_t { Ascending = 0, Descending = 1 };
 
 /// A row that may have gone, in which case its number may already name another.
 struct RowRef {
@@ -26,8 +28,15 @@ struct RowRef {
     friend bool operator==(const RowRef&, const RowRef&) = default;
 };
 
-/// The rows of a list: their order, texts and states, made for 100,000 of them. A row takes about 30 bytes besides the texts that
-/// were set by themselves. Positions count from 0; a `RowId` must name a row that is in the list.
+/// The rows from a position on.
+struct RowRange {
+    RowOrder::Position first = 0;
+    RowOrder::Position count = 0;
+};
+
+/// The rows of a list: their order, texts and states, made for 100,000 of them. A row takes about 26 bytes besides the texts that
+/// were set by themselves, and 11 more once a row was looked for by its text. Positions count from 0; a `RowId` must name a row
+/// that is in the list.
 ///
 /// Sorting: by the texts of one column, without regard to case, rows with equal texts keep their order. The rows settle by the
 /// texts then standing when one is added, when one of the three sort settings is set, and in `TakeChanges`; setting a text moves
@@ -43,12 +52,13 @@ class ListRows {
     RowId At(Position position) const { return order_.At(position); }
     Position PositionOf(RowId row) const { return order_.PositionOf(row); }
     RowRef Ref(RowId row) const { return {row, rows_[row].serial}; }
-    bool Lives(RowRef ref) const { return ref.serial != 0 && ref.row < rows_.size() && rows_[ref.row].serial == ref.serial; }
+    bool Lives(RowRef ref) const { return ref.serial != 0 && ref.row < rows_.Size() && rows_[ref.row].serial == ref.serial; }
 
-    /// Adds a row with a text of its own and empty sub-items: behind all others, or where it sorts.
-    RowId Add(std::string_view text);
+    /// Adds a row with a text of its own and empty sub-items: where it sorts, in a list that is not sorted at a position from 0 to
+    /// `Count`, behind all others where none is given.
+    RowId Add(std::string_view text, std::optional<Position> position = {});
     /// The number that the next row will have: a control captures under it what its source makes texts of.
-    RowId NextId() const { return free_.empty() ? static_cast<RowId>(rows_.size()) : free_.back(); }
+    RowId NextId() const { return free_.empty() ? numbers_ : free_.back(); }
     /// Adds a row whose text the source makes; its sub-items are empty until `Fill`.
     RowId AddFromSource();
     /// The source makes the sub-items of this row from now on.
@@ -63,8 +73,16 @@ class ListRows {
     /// The first row in the order whose text is this, without regard to case.
     std::optional<RowId> Find(std::string_view text) const;
 
+    /// The key of a row, unique in the list without regard to case; empty for none.
+    std::string Key(RowId row) const;
+    /// Error 35602 for a key that another row has.
+    frame::Status SetKey(RowId row, std::string_view key);
+    std::optional<RowId> FindKey(std::string_view key) const;
+
     bool Selected(RowId row) const { return Has(row, selected); }
     void SetSelected(RowId row, bool value);
+    /// Selects or deselects the rows of a range that lies in the list.
+    void SetSelected(RowRange range, bool value);
     std::uint32_t SelectedCount() const { return selectedCount_; }
     void ClearSelection();
     bool Ghosted(RowId row) const { return Has(row, ghosted); }
@@ -99,28 +117,32 @@ class ListRows {
         std::uint8_t flags = 0;
     };
     struct Moving;
-    static constexpr std::uint8_t selected = 1, ghosted = 2, unsettled = 4, tagged = 8;
+    using RowsByKey = std::unordered_map<std::string, RowId, frame::HashNoCase, frame::EqualNoCase>;
+    static constexpr std::uint8_t selected = 1, ghosted = 2, unsettled = 4, tagged = 8, keyed = 16;
 
     bool Has(RowId row, std::uint8_t flag) const { return (rows_[row].flags & flag) != 0; }
     void SetFlag(RowId row, std::uint8_t flag, bool value);
     RowIcons::IconId IconOf(RowId row, IconSize size) const { return rows_[row].icons[static_cast<std::size_t>(size)]; }
     void StoreIcon(RowId row, IconSize size, RowIcons::IconId icon);
-    RowId AddRow(std::string_view text, RowTexts::ColumnZero columnZero);
+    RowId AddRow(std::string_view text, RowTexts::ColumnZero columnZero, std::optional<Position> position);
     void RowChanged(RowId row);
     void TextChanged(RowId row, int column);
     void DropIndex() { index_.reset(); }
+    void DropKey(RowId row);
 
+    bool Ascending() const { return sortOrder_ == ListSortOrderConstants::Ascending; }
     void Settle();
     void SettleAnew();
     void SortAll();
     void MoveUnsettled();
     std::vector<Moving> TakeUnsettled();
-    Position PlaceOfNew(std::string_view key) const;
+    Position PlaceOfNew(const RowKey& key) const;
     template <class RowAt>
-    Position PlaceOf(std::string_view key, Position count, Position stay, RowAt&& rowAt) const;
+    Position PlaceOf(const RowKey& key, Position count, Position stay, RowAt&& rowAt) const;
 
     std::function<void()> changed_;
-    std::vector<Row> rows_;
+    RowPages<Row> rows_;
+    RowId numbers_ = 0;  // that were given to rows, of which `free_` are free again
     std::vector<RowId> free_;
     std::uint32_t lastSerial_ = 0;
     RowOrder order_;
@@ -128,6 +150,8 @@ class ListRows {
     mutable std::unique_ptr<TextIndex> index_;  // made when first asked
     RowIcons icons_;
     std::unordered_map<RowId, frame::Variant> tags_;
+    RowsByKey ofKey_;
+    std::unordered_map<RowId, std::string> keys_;
     std::uint32_t selectedCount_ = 0;
 
     bool sorted_ = false;

@@ -11,7 +11,7 @@ namespace tessel::child {
 struct ListRows::Moving {
     RowId row = 0;
     Position from = 0;
-    std::string key;
+    RowKey key;
     Position to = 0;  // among the rows that stay
 };
 
@@ -51,27 +51,15 @@ void ListRows::Settle() {
 }
 
 void ListRows::SortAll() {
-    struct Keyed {
-        std::string key;
-        RowId row;
-    };
     const std::vector<RowId> before = order_.All();
-    std::vector<Keyed> keyed;
-    keyed.reserve(before.size());
-    for (const RowId row : before) keyed.push_back({Text(row, sortKey_), row});
-    const bool ascending = sortOrder_ == ListSortOrderConstants::Ascending;
-    std::stable_sort(keyed.begin(), keyed.end(), [&](const Keyed& a, const Keyed& b) {
-        const int order = frame::CompareNoCase(a.key, b.key);
-        return ascending ? order < 0 : order > 0;
-    });
-    std::vector<RowId> after(before.size());
-    std::transform(keyed.begin(), keyed.end(), after.begin(), [](const Keyed& entry) { return entry.row; });
+    std::vector<RowId> after = before;
+    RowSort(texts_, sortKey_).Sort(after, Ascending());
 
     for (const RowId row : std::exchange(unsettled_, {}))
-        if (row < rows_.size()) rows_[row].flags &= static_cast<std::uint8_t>(~unsettled);
+        if (row < rows_.Size()) rows_[row].flags &= static_cast<std::uint8_t>(~unsettled);
     if (after == before) return;
     order_.Assign(after);
-    if (followed_) journal_.Reset();
+    if (followed_) journal_.Reordered(Count());
 }
 
 void ListRows::MoveUnsettled() {
@@ -87,10 +75,9 @@ void ListRows::MoveUnsettled() {
     for (std::size_t i = 0; i < moving.size(); ++i) moving[i].to = PlaceOf(moving[i].key, count, gaps[i], staying);
 
     std::vector<Moving> leaving = moving;
-    const bool ascending = sortOrder_ == ListSortOrderConstants::Ascending;
     std::stable_sort(moving.begin(), moving.end(), [&](const Moving& a, const Moving& b) {
-        const int order = frame::CompareNoCase(a.key, b.key);
-        return ascending ? order < 0 : order > 0;
+        const int order = frame::CompareNoCase(a.key.text, b.key.text);
+        return Ascending() ? order < 0 : order > 0;
     });
     for (std::size_t i = 0; i < moving.size(); ++i) moving[i].to += static_cast<Position>(i);
     const bool standsStill = std::all_of(moving.begin(), moving.end(), [](const Moving& row) { return row.from == row.to; });
@@ -109,27 +96,28 @@ void ListRows::MoveUnsettled() {
 std::vector<ListRows::Moving> ListRows::TakeUnsettled() {
     std::vector<Moving> moving;
     for (const RowId row : unsettled_) {
-        if (row >= rows_.size() || !Has(row, unsettled)) continue;
+        if (row >= rows_.Size() || !Has(row, unsettled)) continue;
         rows_[row].flags &= static_cast<std::uint8_t>(~unsettled);
-        moving.push_back({row, PositionOf(row), Text(row, sortKey_), 0});
+        moving.push_back({row, PositionOf(row), RowSort(texts_, sortKey_).KeyOf(row), 0});
     }
     unsettled_.clear();
     std::sort(moving.begin(), moving.end(), [](const Moving& a, const Moving& b) { return a.from < b.from; });
     return moving;
 }
 
-ListRows::Position ListRows::PlaceOfNew(std::string_view key) const {
-    return sorted_ ? PlaceOf(key, Count(), Count(), [&](Position at) { return order_.At(at); }) : Count();
+ListRows::Position ListRows::PlaceOfNew(const RowKey& key) const {
+    return PlaceOf(key, Count(), Count(), [&](Position at) { return order_.At(at); });
 }
 
 /// Where a row with this key belongs among `count` sorted rows, when without a reason it would stay before the one at `stay`.
 /// Both ends are tried first: rows often come in order.
 template <class RowAt>
-ListRows::Position ListRows::PlaceOf(std::string_view key, Position count, Position stay, RowAt&& rowAt) const {
+ListRows::Position ListRows::PlaceOf(const RowKey& key, Position count, Position stay, RowAt&& rowAt) const {
+    const RowSort sort(texts_, sortKey_);
     const auto standsBefore = [&](Position at) {
-        const int order = frame::CompareNoCase(Text(rowAt(at), sortKey_), key);
+        const int order = sort.Compare(rowAt(at), key);
         if (order == 0) return at < stay;
-        return sortOrder_ == ListSortOrderConstants::Ascending ? order < 0 : order > 0;
+        return Ascending() ? order < 0 : order > 0;
     };
     if (count == 0 || !standsBefore(0)) return 0;
     if (standsBefore(count - 1)) return count;

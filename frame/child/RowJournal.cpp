@@ -31,6 +31,7 @@ void RowJournal::Changed(std::uint32_t first, std::uint32_t count) {
     if (IsReset()) return;
     const std::uint32_t end = first + count;
     if (RowChange* last = Last(Kind::Inserted); last && first >= last->first && end <= last->first + last->count) return;
+    if (Last(Kind::Reordered)) return;
     if (RowChange* last = Last(Kind::Changed); last && first <= last->first + last->count && end >= last->first) {
         const std::uint32_t lastEnd = std::max(end, last->first + last->count);
         last->first = std::min(first, last->first);
@@ -38,6 +39,12 @@ void RowJournal::Changed(std::uint32_t first, std::uint32_t count) {
     } else {
         Add({Kind::Changed, first, count});
     }
+}
+
+void RowJournal::Reordered(std::uint32_t count) {
+    if (IsReset() || Last(Kind::Reordered)) return;
+    if (Last(Kind::Changed)) changes_.pop_back();
+    Add({Kind::Reordered, 0, count});
 }
 
 void RowJournal::Reset() { changes_.assign(1, {Kind::Reset, 0, 0}); }

@@ -8,10 +8,11 @@ namespace tessel::child {
 /// One step from what a peer shows to what the list holds. Positions count from 0, in the list as it is at that step.
 struct RowChange {
     enum class Kind : std::uint8_t {
-        Inserted,  ///< `count` rows stand new from `first` on
-        Removed,   ///< `count` rows from `first` on have gone
-        Changed,   ///< rows may read otherwise
-        Reset,     ///< read the whole list anew
+        Inserted,   ///< `count` rows stand new from `first` on
+        Removed,    ///< `count` rows from `first` on have gone
+        Changed,    ///< rows may read otherwise
+        Reordered,  ///< the same rows, `count` in all, stand in another order and may read otherwise
+        Reset,      ///< read the whole list anew
     };
     Kind kind = Kind::Reset;
     std::uint32_t first = 0;
@@ -27,6 +28,8 @@ class RowJournal {
     void Inserted(std::uint32_t position);
     void Removed(std::uint32_t position);
     void Changed(std::uint32_t first, std::uint32_t count = 1);
+    /// All `count` rows of the list have been put in another order.
+    void Reordered(std::uint32_t count);
     void Reset();
 
     /// Whether all has to be read anew: further changes add nothing.

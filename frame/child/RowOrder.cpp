@@ -64,7 +64,6 @@ std::vector<RowId> RowOrder::All() const {
 
 void RowOrder::Assign(std::span<const RowId> rows) {
     RowOrder fresh;
-    fresh.chunkOf_.reserve(chunkOf_.size());
     for (const RowId row : rows) fresh.Append(row);
     *this = std::move(fresh);
 }
@@ -138,7 +137,7 @@ void RowOrder::Adopt(ChunkId chunk, std::span<const RowId> rows) {
 }
 
 void RowOrder::NoteChunk(RowId row, ChunkId chunk) {
-    if (row >= chunkOf_.size()) chunkOf_.resize(std::size_t{row} + 1);
+    chunkOf_.MakeRoom(row);
     chunkOf_[row] = chunk;
 }
 

@@ -5,10 +5,9 @@
 #include <span>
 #include <vector>
 
-namespace tessel::child {
+#include "frame/child/RowPages.h"
 
-/// A row by its number in the list's storage. A number is used again once its row has gone.
-using RowId = std::uint32_t;
+namespace tessel::child {
 
 /// The order of the rows of a list: a sequence of row ids, each at most once, with positions from 0. Inserting, removing and
 /// both ways of looking up stay cheap with hundreds of thousands of rows; appending is the cheapest.
@@ -71,7 +70,7 @@ class RowOrder {
     std::vector<ChunkId> spare_;
     std::vector<ChunkId> sequence_;  // the chunks in their order
     std::vector<Position> counts_;
-    std::vector<ChunkId> chunkOf_;  // by row id
+    RowPages<ChunkId> chunkOf_;
     Position size_ = 0;
 };
 

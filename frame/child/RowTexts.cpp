@@ -1,13 +1,14 @@
 #include "frame/child/RowTexts.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "frame/Text.h"
 
 namespace tessel::child {
 
 void RowTexts::Begin(RowId row, ColumnZero columnZero) {
-    if (row >= flags_.size()) flags_.resize(std::size_t{row} + 1);
+    flags_.MakeRoom(row);
     flags_[row] = columnZero == ColumnZero::FromSource ? fromSource : 0;
 }
 
@@ -17,18 +18,25 @@ void RowTexts::End(RowId row) {
 }
 
 void RowTexts::Clear() {
-    flags_.clear();
+    flags_.Clear();
     own_.clear();
 }
 
 std::string RowTexts::Text(RowId row, int column) const {
-    const std::uint8_t flags = flags_[row];
-    if (flags & hasOwn) {
-        for (const OwnText& own : own_.find(row)->second)
-            if (own.column == column) return own.text;
-    }
-    const bool made = (flags & (column == 0 ? fromSource : filled)) != 0;
-    return made && source_ ? source_->Text(row, column) : std::string();
+    if (const std::string* own = Own(row, column)) return *own;
+    return IsMade(row, column) ? source_->Text(row, column) : std::string();
+}
+
+void RowTexts::AppendText(RowId row, int column, std::string& out) const {
+    if (const std::string* own = Own(row, column))
+        out += *own;
+    else if (IsMade(row, column))
+        source_->AppendText(row, column, out);
+}
+
+std::optional<std::uint64_t> RowTexts::SortNumber(RowId row, int column) const {
+    if (const std::string* own = Own(row, column)) return own->empty() ? std::optional<std::uint64_t>(0) : std::nullopt;
+    return IsMade(row, column) ? source_->SortNumber(row, column) : 0;
 }
 
 bool RowTexts::SetText(RowId row, int column, std::string_view text) {
@@ -43,16 +51,48 @@ bool RowTexts::SetText(RowId row, int column, std::string_view text) {
     return true;
 }
 
-void TextIndex::Add(RowId row, std::string_view text) { rows_.emplace(Hash(text), row); }
-
-bool TextIndex::Remove(RowId row, std::string_view text) {
-    const auto [first, last] = rows_.equal_range(Hash(text));
-    const auto found = std::find_if(first, last, [&](const auto& entry) { return entry.second == row; });
-    if (found == last) return false;
-    rows_.erase(found);
-    return true;
+const std::string* RowTexts::Own(RowId row, int column) const {
+    if (!(flags_[row] & hasOwn)) return nullptr;
+    for (const OwnText& own : own_.find(row)->second)
+        if (own.column == column) return &own.text;
+    return nullptr;
 }
 
-std::size_t TextIndex::Hash(std::string_view text) { return frame::HashNoCase()(text); }
+void TextIndex::Add(RowId row, std::string_view text) {
+    constexpr std::size_t rowsPerBucket = 2;
+    if (count_ >= heads_.size() * rowsPerBucket) Widen();
+    entries_.MakeRoom(row);
+    entries_[row].hash = Hash(text);
+    Link(row);
+    ++count_;
+}
+
+void TextIndex::Remove(RowId row) {
+    RowId* link = &heads_[Bucket(entries_[row].hash)];
+    while (*link != row) link = &entries_[*link].next;
+    *link = entries_[row].next;
+    --count_;
+}
+
+std::uint32_t TextIndex::Hash(std::string_view text) {
+    const std::uint64_t hash = frame::HashNoCase()(text);
+    return static_cast<std::uint32_t>(hash ^ hash >> 32);
+}
+
+void TextIndex::Link(RowId row) {
+    RowId& head = heads_[Bucket(entries_[row].hash)];
+    entries_[row].next = std::exchange(head, row);
+}
+
+void TextIndex::Widen() {
+    constexpr std::size_t fewest = 32;
+    const std::vector<RowId> before = std::exchange(heads_, std::vector<RowId>(std::max(fewest, heads_.size() * 2), none));
+    for (RowId head : before)
+        while (head != none) {
+            const RowId next = entries_[head].next;
+            Link(head);
+            head = next;
+        }
+}
 
 }  // namespace tessel::child

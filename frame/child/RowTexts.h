@@ -1,12 +1,13 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <string>
 #include <string_view>
 #include <unordered_map>
 #include <vector>
 
-#include "frame/child/RowOrder.h"
+#include "frame/child/RowPages.h"
 
 namespace tessel::child {
 
@@ -16,6 +17,14 @@ class RowSource {
   public:
     virtual ~RowSource() = default;
     virtual std::string Text(RowId row, int column) const = 0;
+
+    /// Appends the text: for a source that has it at hand, so that sorting makes no string of each.
+    virtual void AppendText(RowId row, int column, std::string& out) const { out += Text(row, column); }
+
+    /// A number that stands in for the text where rows are sorted by this column: such numbers order as the texts do without
+    /// regard to case, and are equal just where the texts are. 0 stands for the empty text and for no other. Nothing for a row
+    /// whose text has no such number: those rows, and in a full sort all rows, are then compared by their texts.
+    virtual std::optional<std::uint64_t> SortNumber(RowId /*row*/, int /*column*/) const { return std::nullopt; }
 };
 
 /// The texts of the rows of a list. What was set by itself stands aside, in a store that has room only for rows with such texts,
@@ -33,6 +42,9 @@ class RowTexts {
     void Clear();
 
     std::string Text(RowId row, int column) const;
+    void AppendText(RowId row, int column, std::string& out) const;
+    /// The number that stands in for the text in a sort, where there is one; see `RowSource::SortNumber`.
+    std::optional<std::uint64_t> SortNumber(RowId row, int column) const;
     /// False when it reads so already.
     bool SetText(RowId row, int column, std::string_view text);
 
@@ -43,28 +55,46 @@ class RowTexts {
     };
     static constexpr std::uint8_t fromSource = 1, filled = 2, hasOwn = 4;
 
+    /// Null for a text that the row has not by itself.
+    const std::string* Own(RowId row, int column) const;
+    bool IsMade(RowId row, int column) const { return source_ && (flags_[row] & (column == 0 ? fromSource : filled)) != 0; }
+
     const RowSource* source_ = nullptr;
-    std::vector<std::uint8_t> flags_;  // by row
+    RowPages<std::uint8_t> flags_;
     std::unordered_map<RowId, std::vector<OwnText>> own_;
 };
 
-/// Finds rows by a text without regard to case. Holds hashes only: what it names has to be compared.
+/// Finds rows by a text without regard to case. Holds hashes only: what it names has to be compared. About 11 bytes a row.
 class TextIndex {
   public:
+    /// `row` is not in the index.
     void Add(RowId row, std::string_view text);
-    /// `text` is what the row was added with. False when it was not added so: the index is then of no use any more.
-    bool Remove(RowId row, std::string_view text);
+    /// `row` is in the index.
+    void Remove(RowId row);
     /// Calls `each` with every row that may have the text, in no particular order.
     template <class F>
     void Candidates(std::string_view text, F&& each) const {
-        const auto [first, last] = rows_.equal_range(Hash(text));
-        for (auto at = first; at != last; ++at) each(at->second);
+        if (heads_.empty()) return;
+        const std::uint32_t hash = Hash(text);
+        for (RowId row = heads_[Bucket(hash)]; row != none; row = entries_[row].next)
+            if (entries_[row].hash == hash) each(row);
     }
 
   private:
-    static std::size_t Hash(std::string_view text);
+    static constexpr RowId none = 0xFFFFFFFFu;
+    struct Entry {
+        std::uint32_t hash = 0;
+        RowId next = none;  // in the same bucket
+    };
 
-    std::unordered_multimap<std::size_t, RowId> rows_;
+    static std::uint32_t Hash(std::string_view text);
+    std::size_t Bucket(std::uint32_t hash) const { return hash & (heads_.size() - 1); }
+    void Link(RowId row);
+    void Widen();
+
+    RowPages<Entry> entries_;
+    std::vector<RowId> heads_;  // the first row of each bucket; their number is a power of two
+    std::size_t count_ = 0;
 };
 
 }  // namespace tessel::child

@@ -18,6 +18,7 @@
 #include "frame/Text.h"
 #include "hosts/headless/HeadlessHost.h"
 #include "tests/ErrorOf.h"
+#include "tests/frame/child/ListOwner.h"
 
 namespace tessel::child {
 namespace {
@@ -25,6 +26,7 @@ namespace {
 using frame::ObjectRef;
 using frame::Variant;
 using test::ErrorOf;
+using test::ListOwner;
 using testing::ElementsAre;
 using testing::IsEmpty;
 using testing::SizeIs;
@@ -35,6 +37,7 @@ class Keys final : public KeySet {
     Keys(std::set<std::string, std::less<>> keys) : keys_(std::move(keys)) {}
     bool Has(std::string_view key) const override { return keys_.contains(key); }
     std::int32_t Count() const override { return static_cast<std::int32_t>(keys_.size()); }
+    std::uint32_t Revision() const override { return 0; }
 
   private:
     std::set<std::string, std::less<>> keys_;
@@ -44,7 +47,8 @@ class Keys final : public KeySet {
 class Records final : public RowSource {
   public:
     std::string Text(RowId row, int column) const override {
-        if (fails) throw frame::ControlError(errors::internal);
+        if (fails || failsAfter == 0) throw frame::ControlError(errors::internal);
+        if (failsAfter > 0) --failsAfter;
         ++asked;
         const std::string& name = names.at(row);
         return column == 0 ? name : name + "/" + frame::Decimal(column);
@@ -52,35 +56,7 @@ class Records final : public RowSource {
     std::map<RowId, std::string> names;
     mutable int asked = 0;
     bool fails = false;
-};
-
-/// A control with nothing but a list, which writes down what it hears from it.
-class ListOwner final : public frame::Control {
-  public:
-    explicit ListOwner(frame::Host& host) : Control(host) {
-        list.ItemClick.To<&ListOwner::ItemClicked>(*this);
-        list.MouseDown.To<&ListOwner::MousePressed>(*this);
-        list.KeyDown.To<&ListOwner::KeyPressed>(*this);
-        list.DblClick.To<&ListOwner::DoubleClicked>(*this);
-    }
-    frame::TextSize DesignSize() const override { return {3000, 2000}; }
-    const frame::ClassTable& Table() const override {
-        static constexpr frame::ClassTable table{.name = "ListOwner", .members = {}};
-        return table;
-    }
-
-    ListView list{*this, "ListFiles"};
-    std::string heard;
-
-  private:
-    void ItemClicked(std::int32_t index) { heard += "ItemClick " + list.SelectedItem()->Text() + " " + frame::Decimal(index); }
-    void MousePressed(std::int16_t button, std::int16_t, float, float y) {
-        heard += "MouseDown " + frame::Decimal(button) + " " + frame::Decimal(static_cast<int>(y));
-    }
-    void KeyPressed(std::int16_t keyCode, std::int16_t shift) {
-        heard += "KeyDown " + frame::Decimal(keyCode) + " " + frame::Decimal(shift);
-    }
-    void DoubleClicked() { heard += "DblClick"; }
+    mutable int failsAfter = -1;  // so many texts; below 0 never
 };
 
 /// Follows a list as a screen does, and keeps its texts.
@@ -111,6 +87,10 @@ class Screen final : public frame::Peer {
                 break;
             case RowChange::Kind::Changed:
                 std::fill(first, first + change.count, toRead);
+                break;
+            case RowChange::Kind::Reordered:
+                EXPECT_EQ(change.count, texts.size());
+                std::fill(texts.begin(), texts.end(), toRead);
                 break;
             case RowChange::Kind::Reset:
                 texts.assign(list_.Rows().Count(), toRead);
@@ -258,7 +238,7 @@ TEST_F(ListItemsTest, AnIconKeyThatTheImagesLackIsError35601AndChangesNothing) {
     EXPECT_EQ(Item(1)->SmallIcon(), Variant("exe"));
 }
 
-TEST_F(ListItemsTest, AnIconMayBeAnIndexAndIsTakenAwayByZeroAndByTheEmptyKey) {
+TEST_F(ListItemsTest, AnIconMayBeAnIndexAndIsTakenAwayByZeroAndByAnEmptyValue) {
     const Keys keys({"txt", "exe"});
     Rows().BindIcons(IconSize::Large, &keys);
     Add({"a"});
@@ -269,8 +249,17 @@ TEST_F(ListItemsTest, AnIconMayBeAnIndexAndIsTakenAwayByZeroAndByTheEmptyKey) {
     EXPECT_FALSE(Item(1)->SetIcon(0).Failed());
     EXPECT_TRUE(Item(1)->Icon().IsEmpty());
     EXPECT_FALSE(Item(1)->SetIcon("txt").Failed());
-    EXPECT_FALSE(Item(1)->SetIcon("").Failed());
+    EXPECT_FALSE(Item(1)->SetIcon(Variant()).Failed());
     EXPECT_TRUE(Item(1)->Icon().IsEmpty());
+}
+
+TEST_F(ListItemsTest, TheEmptyKeyIsLackingInEveryImageList) {
+    const Keys keys({"txt"});
+    Rows().BindIcons(IconSize::Large, &keys);
+    Add({"a"});
+    EXPECT_FALSE(Item(1)->SetIcon("txt").Failed());
+    EXPECT_EQ(Item(1)->SetIcon("").Number(), errors::elementNotFound);
+    EXPECT_EQ(Item(1)->Icon(), Variant("txt"));
 }
 
 TEST_F(ListItemsTest, WithoutImagesEveryKeyIsLacking) {
@@ -503,6 +492,18 @@ TEST_F(ListSourceTest, ASourceThatFailsLeavesTheRowsWhole) {
     EXPECT_EQ(Texts(), "d c b a");
 }
 
+TEST_F(ListSourceTest, ASearchThatASourceFailsLeavesTheRowsWhole) {
+    Rows().SetSource(&records);
+    for (const char* name : {"a", "b", "c"}) Capture(name);
+    records.failsAfter = 2;
+    EXPECT_EQ(ErrorOf([&] { List().FindItem("c"); }), errors::internal);
+    records.failsAfter = -1;
+    List().ListItems.Remove(3);
+    List().ListItems.Remove(1);
+    EXPECT_EQ(List().FindItem("b")->Index(), 1);
+    EXPECT_EQ(List().FindItem("c"), nullptr);
+}
+
 TEST_F(ListSourceTest, ARowThatASourceKeptFromSettlingSettlesLater) {
     Rows().SetSource(&records);
     List().SetSorted(true);
@@ -715,6 +716,19 @@ TEST_F(ListPeerTest, ARowSettlesBeforeItIsShown) {
     EXPECT_EQ(screen.texts.back(), "m");
     EXPECT_EQ(Texts(), "a c d e f g h i j m");
     EXPECT_THAT(screen.seen.back(), SizeIs(3));  // the row has changed, left and come back
+}
+
+TEST_F(ListPeerTest, ASortIsOneStepThatKeepsTheRows) {
+    Add({"b", "a", "c"});
+    const Screen& screen = Show();
+    Item(1)->SetText("z");
+    List().SetSorted(true);
+    Item(1)->SetGhosted(true);
+    List().SetSortOrder(ListSortOrderConstants::Descending);
+    host.Frame().Flush();
+    ASSERT_THAT(screen.seen, SizeIs(1));
+    EXPECT_THAT(screen.seen.back(), ElementsAre(RowChange{RowChange::Kind::Reordered, 0, 3}));
+    EXPECT_THAT(screen.texts, ElementsAre("z", "c", "a"));
 }
 
 TEST_F(ListPeerTest, AClickIsShownWhenItsInputEnds) {

@@ -10,7 +10,7 @@
 namespace tessel::child {
 
 void PrintTo(const RowChange& change, std::ostream* out) {
-    constexpr const char* kinds[] = {"Inserted", "Removed", "Changed", "Reset"};
+    constexpr const char* kinds[] = {"Inserted", "Removed", "Changed", "Reordered", "Reset"};
     *out << kinds[static_cast<int>(change.kind)] << ' ' << change.first << '+' << change.count;
 }
 
@@ -52,6 +52,22 @@ TEST(RowJournalTest, RowsInsertedElsewhereAreEntriesOfTheirOwn) {
     RowJournal journal;
     for (const std::uint32_t position : {5u, 4u, 9u}) journal.Inserted(position);
     EXPECT_THAT(journal.Take(), ElementsAre(Inserted(5, 1), Inserted(4, 1), Inserted(9, 1)));
+}
+
+TEST(RowJournalTest, AnotherOrderReadsAllRowsAnew) {
+    RowJournal journal;
+    journal.Inserted(0);
+    journal.Changed(3);
+    journal.Reordered(9);
+    journal.Changed(4);
+    journal.Reordered(9);
+    journal.Removed(2);
+    journal.Reordered(8);
+    constexpr auto reordered = RowChange::Kind::Reordered;
+    EXPECT_THAT(journal.Take(), ElementsAre(Inserted(0, 1), RowChange{reordered, 0, 9}, Removed(2, 1), RowChange{reordered, 0, 8}));
+    journal.Reset();
+    journal.Reordered(8);
+    EXPECT_THAT(journal.Take(), ElementsAre(reset));
 }
 
 TEST(RowJournalTest, ANewRowThatGoesAgainLeavesNoTrace) {
@@ -129,6 +145,10 @@ class Follower {
             case RowChange::Kind::Changed:
                 std::fill(first, first + change.count, toRead);
                 break;
+            case RowChange::Kind::Reordered:
+                EXPECT_EQ(change.count, rows.size());
+                std::fill(rows.begin(), rows.end(), toRead);
+                break;
             case RowChange::Kind::Reset:
                 rows.assign(size, toRead);
                 wasReset = true;
@@ -144,7 +164,7 @@ TEST(RowJournalTest, AFollowerThatAppliesTheStepsHoldsTheList) {
     RowJournal journal;
     Follower follower;
     for (int value = 1; value <= 50'000; ++value) {
-        const auto kind = below(6);
+        const auto kind = below(13) / 2;
         const auto near = list.empty() ? 0 : std::min(below(list.size()), below(list.size()));
         const auto at = static_cast<std::ptrdiff_t>(near);
         if (kind < 3 || list.empty()) {
@@ -153,6 +173,9 @@ TEST(RowJournalTest, AFollowerThatAppliesTheStepsHoldsTheList) {
         } else if (kind == 3) {
             list.erase(list.begin() + at);
             journal.Removed(static_cast<std::uint32_t>(at));
+        } else if (kind == 6) {
+            std::shuffle(list.begin(), list.end(), numbers);
+            journal.Reordered(static_cast<std::uint32_t>(list.size()));
         } else {
             list[near] = value;
             journal.Changed(static_cast<std::uint32_t>(at));
