@@ -61,7 +61,9 @@ frame::Object& ControlWidget::extender() const {
 void ControlWidget::adopt() {
     site_ = std::make_unique<Site>(host_, *this);
     enter("Initialize", [&](Site& site) { site.Adopt(class_.make(host_->frameHost())); });
-    site_->surface()->Show(&site_->Control());
+    site_->surface()->Show(&site_->Control(), [this] {
+        if (settled_) enter("Paint", [](Site& site) { site.Paint(); });
+    });
     site_->surface()->setAttribute(Qt::WA_TransparentForMouseEvents, designTime());
 }
 

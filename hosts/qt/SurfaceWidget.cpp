@@ -2,6 +2,7 @@
 
 #include <qdrawutil.h>
 
+#include <QEvent>
 #include <QImage>
 #include <QPainter>
 #include <cmath>
@@ -101,8 +102,10 @@ SurfaceWidget::SurfaceWidget(QWidget* parent) : QWidget(parent) {
     setMouseTracking(true);
 }
 
-void SurfaceWidget::Show(frame::Control* control) {
+void SurfaceWidget::Show(frame::Control* control, std::function<void()> needsDrawing) {
     control_ = control;
+    needsDrawing_ = std::move(needsDrawing);
+    drawnFor_ = 0;
     Follow();
 }
 
@@ -118,6 +121,11 @@ void SurfaceWidget::Follow() {
 
 void SurfaceWidget::paintEvent(QPaintEvent*) {
     if (!control_) return;
+    if (needsDrawing_ && drawnFor_ != devicePixelRatioF()) {
+        drawnFor_ = devicePixelRatioF();
+        needsDrawing_();
+        if (!control_) return;
+    }
     const frame::OwnSurface& surface = control_->Surface();
     QPainter painter(this);
     if (!IsSurroundings(surface.BackColor())) painter.fillRect(rect(), ToQt(surface.BackColor(), control_->Host().Colors()));
@@ -128,6 +136,13 @@ void SurfaceWidget::paintEvent(QPaintEvent*) {
         qDrawWinPanel(&painter, rect(), palette(), true);
     else
         qDrawPlainRect(&painter, rect(), palette().color(QPalette::WindowText));
+}
+
+void SurfaceWidget::resizeEvent(QResizeEvent*) { drawnFor_ = 0; }
+
+void SurfaceWidget::changeEvent(QEvent* event) {
+    if (event->type() == QEvent::PaletteChange) drawnFor_ = 0;
+    QWidget::changeEvent(event);
 }
 
 }  // namespace tessel::qt

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QWidget>
+#include <functional>
 #include <memory>
 #include <vector>
 
@@ -39,17 +40,22 @@ class SurfaceWidget final : public QWidget {
   public:
     explicit SurfaceWidget(QWidget* parent);
 
-    /// The control whose surface is shown; null for none, when its site is no longer in its host.
-    void Show(frame::Control* control);
+    /// The control whose surface is shown; null for none, when its site is no longer in its host. `needsDrawing` is called before
+    /// the surface is painted first, and again when it has another size or other colours: what was drawn persists until then.
+    void Show(frame::Control* control, std::function<void()> needsDrawing = {});
     /// Follows the look of the surface.
     void Follow();
     SurfaceCanvas* canvas = nullptr;  ///< of the control
 
   protected:
     void paintEvent(QPaintEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
+    void changeEvent(QEvent* event) override;
 
   private:
     frame::Control* control_ = nullptr;
+    std::function<void()> needsDrawing_;
+    double drawnFor_ = 0;  // the scale of the screen; 0 when the drawing is out of date
 };
 
 }  // namespace tessel::qt
