@@ -66,34 +66,11 @@ TwipsRect WidgetObject::Place() const {
             each(pixels.width(), pixelsSet_.width(), set_.width), each(pixels.height(), pixelsSet_.height(), set_.height)};
 }
 
-void WidgetObject::SetPlace(const TwipsRect& place) {
-    Live().setGeometry(PixelRect(place.left, place.top, place.width, place.height));
-    set_ = place;
-    pixelsSet_ = Live().geometry();
-}
-
-void WidgetObject::SetLeft(float value) {
-    TwipsRect place = Place();
-    place.left = value;
-    SetPlace(place);
-}
-
-void WidgetObject::SetTop(float value) {
-    TwipsRect place = Place();
-    place.top = value;
-    SetPlace(place);
-}
-
-void WidgetObject::SetWidth(float value) {
-    TwipsRect place = Place();
-    place.width = value;
-    SetPlace(place);
-}
-
-void WidgetObject::SetHeight(float value) {
-    TwipsRect place = Place();
-    place.height = value;
-    SetPlace(place);
+void WidgetObject::SetPart(float TwipsRect::*part, float value) {
+    set_ = Place();
+    set_.*part = value;
+    pixelsSet_ = PixelRect(set_.left, set_.top, set_.width, set_.height);
+    Live().setGeometry(pixelsSet_);
 }
 
 bool WidgetObject::Enabled() const {

@@ -39,13 +39,13 @@ class WidgetObject : public frame::Object {
     // Error 91 for each when the widget has gone.
     std::string Name() const;
     float Left() const { return Place().left; }
-    void SetLeft(float value);
+    void SetLeft(float value) { SetPart(&TwipsRect::left, value); }
     float Top() const { return Place().top; }
-    void SetTop(float value);
+    void SetTop(float value) { SetPart(&TwipsRect::top, value); }
     float Width() const { return Place().width; }
-    void SetWidth(float value);
+    void SetWidth(float value) { SetPart(&TwipsRect::width, value); }
     float Height() const { return Place().height; }
-    void SetHeight(float value);
+    void SetHeight(float value) { SetPart(&TwipsRect::height, value); }
     bool Visible() const { return !Live().isHidden(); }
     void SetVisible(bool value) { Live().setVisible(value); }
     bool Enabled() const;
@@ -64,13 +64,13 @@ class WidgetObject : public frame::Object {
 
   private:
     TwipsRect Place() const;
-    void SetPlace(const TwipsRect& place);
+    void SetPart(float TwipsRect::*part, float value);
     /// The name of the Qt property that stands behind a member; empty when there is none.
     QByteArray PropertyFor(frame::MemberKey key) const;
 
     QPointer<QWidget> widget_;
     TwipsRect set_;
-    QRect pixelsSet_;  // the geometry that `set_` led to
+    QRect pixelsSet_;  // the geometry asked for by `set_`; the widget may have got another
 };
 
 /// The rows of the members that every widget has.
