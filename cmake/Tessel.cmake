@@ -165,5 +165,5 @@ function(tessel_qt_test name)
     file(MAKE_DIRECTORY ${home})
     file(CHMOD ${home} PERMISSIONS OWNER_READ OWNER_WRITE OWNER_EXECUTE)
     set_tests_properties(${name} PROPERTIES ENVIRONMENT
-        "QT_QPA_PLATFORM=offscreen;HOME=${home};XDG_CONFIG_HOME=${home};XDG_DATA_HOME=${home};XDG_CACHE_HOME=${home};XDG_RUNTIME_DIR=${home};TZ=UTC;LC_ALL=C.UTF-8")
+        "QT_QPA_PLATFORM=offscreen;QT_QPA_PLATFORMTHEME=;QT_SCALE_FACTOR=1;QT_ACCESSIBILITY=1;HOME=${home};XDG_CONFIG_HOME=${home};XDG_DATA_HOME=${home};XDG_CACHE_HOME=${home};XDG_RUNTIME_DIR=${home};TZ=UTC;LC_ALL=C.UTF-8")
 endfunction()

@@ -23,32 +23,59 @@ QJsonValue FontValue(const frame::Font& font) {
                        {"charset", font.Charset()}};
 }
 
+[[noreturn]] void Refuse() { throw frame::ControlError(frame::errors::invalidValue); }
+
+// A part of an object, of the kind that it must have.
+QString TextIn(const QJsonObject& object, const char* key) {
+    if (!object[key].isString()) Refuse();
+    return object[key].toString();
+}
+double NumberIn(const QJsonObject& object, const char* key) {
+    if (!object[key].isDouble()) Refuse();
+    return object[key].toDouble();
+}
+bool FlagIn(const QJsonObject& object, const char* key) {
+    if (object.contains(key) && !object[key].isBool()) Refuse();
+    return object[key].toBool();
+}
+
 Variant FontOf(const QJsonObject& value) {
-    auto font = std::make_shared<frame::Font>(FromQt(value["font"].toString()), value["size"].toDouble());
-    const auto number = [&](const char* key) { return Variant(value[key].toDouble()).ToInteger(); };
-    font->SetWeight(value.contains("weight") ? number("weight") : font->Weight());
-    font->SetItalic(value["italic"].toBool());
-    font->SetUnderline(value["underline"].toBool());
-    font->SetStrikethrough(value["strikethrough"].toBool());
-    font->SetCharset(number("charset"));
+    auto font = std::make_shared<frame::Font>(FromQt(TextIn(value, "font")), NumberIn(value, "size"));
+    const auto number = [&](const char* key, std::int16_t otherwise) {
+        return value.contains(key) ? Variant(NumberIn(value, key)).ToInteger() : otherwise;
+    };
+    font->SetWeight(number("weight", font->Weight()));
+    font->SetItalic(FlagIn(value, "italic"));
+    font->SetUnderline(FlagIn(value, "underline"));
+    font->SetStrikethrough(FlagIn(value, "strikethrough"));
+    font->SetCharset(number("charset", font->Charset()));
     return {std::move(font)};
 }
 
 QJsonValue PictureValue(const frame::Picture& picture) {
     QByteArray png;
-    QBuffer buffer(&png);
-    ToQt(picture, std::numeric_limits<double>::max()).save(&buffer, "PNG");
-    return QJsonObject{
-        {"picture", QString::fromLatin1(png.toBase64())}, {"width", picture.Width()}, {"source", ToQt(picture.Source())}};
+    const QImage image = ToQt(picture, std::numeric_limits<double>::max());
+    if (!image.isNull()) {
+        QBuffer buffer(&png);
+        image.save(&buffer, "PNG");
+    }
+    return QJsonObject{{"picture", QString::fromLatin1(png.toBase64())},
+                       {"width", picture.Width()},
+                       {"height", picture.Height()},
+                       {"source", ToQt(picture.Source())}};
 }
 
 Variant PictureOf(const QJsonObject& value) {
+    const QByteArray png = QByteArray::fromBase64(TextIn(value, "picture").toLatin1());
+    const double width = NumberIn(value, "width"), height = NumberIn(value, "height");
+    const QString source = TextIn(value, "source");
+    if (png.isEmpty())
+        return {std::make_shared<frame::Picture>(static_cast<float>(width), static_cast<float>(height), FromQt(source))};
     QImage image;
-    if (!image.loadFromData(QByteArray::fromBase64(value["picture"].toString().toLatin1()), "PNG"))
-        throw frame::ControlError(frame::errors::invalidPicture);
-    const double pixels = value["width"].toDouble() / frame::twipsPerPixel;
+    if (!image.loadFromData(png, "PNG")) Refuse();
+    const double pixels = width / frame::twipsPerPixel;
     if (pixels > 0) image.setDevicePixelRatio(std::max(1.0, std::round(image.width() / pixels)));
-    return {FromQt(image, value["source"].toString())};
+    return {FromQt(image, source)};
 }
 
 QJsonValue ObjectValue(const Variant& value) {
@@ -87,7 +114,7 @@ Variant NumberOf(const QString& name) {
     if (name == "inf") return infinity;
     if (name == "-inf") return -infinity;
     if (name == "nan") return std::numeric_limits<double>::quiet_NaN();
-    throw frame::ControlError(frame::errors::invalidValue);
+    Refuse();
 }
 
 Variant ValueOf(const QJsonValue& value) {
@@ -108,8 +135,8 @@ Variant ValueOf(const QJsonValue& value) {
     const QJsonObject object = value.toObject();
     if (object.contains("font")) return FontOf(object);
     if (object.contains("picture")) return PictureOf(object);
-    if (object.contains("date")) return frame::Date{object["date"].toDouble()};
-    return NumberOf(object["number"].toString());
+    if (object.contains("date")) return frame::Date{NumberIn(object, "date")};
+    return NumberOf(TextIn(object, "number"));
 }
 
 /// Escapes what is outside ASCII: generated code and forms keep only that as it stands.
@@ -139,7 +166,13 @@ frame::MemoryBag BagOf(const QByteArray& text) {
         throw frame::ControlError(frame::errors::invalidValue, "The saved state cannot be read: " + FromQt(problem.errorString()));
     frame::MemoryBag bag;
     const QJsonObject object = document.object();
-    for (auto at = object.begin(); at != object.end(); ++at) bag.Set(FromQt(at.key()), ValueOf(at.value()));
+    for (auto at = object.begin(); at != object.end(); ++at) {
+        try {
+            bag.Set(FromQt(at.key()), ValueOf(at.value()));
+        } catch (const frame::ControlError&) {
+            throw frame::ControlError(frame::errors::invalidValue, "The saved state cannot be read at " + FromQt(at.key()));
+        }
+    }
     return bag;
 }
 

@@ -90,31 +90,34 @@ void ControlWidget::place(const frame::PropertyBag* saved) {
     const QPointer<ControlWidget> alive = this;
     enter(saved ? "ReadProperties" : "InitProperties", [&](Site& site) { site.Start(saved, width, height); });
     if (!alive) return;
-    followFirstLook();
+    followFirstLook(saved ? Came::Loaded : Came::New);
     started();
     if (shown_) enter("Show", [](Site& site) { site.Show(); });
 }
 
 /// What the widget and the control both know is brought together.
-void ControlWidget::followFirstLook() {
+void ControlWidget::followFirstLook(Came came) {
+    if (came == Came::New && testAttribute(Qt::WA_SetFont) && class_.table->Find("Font")) put("Font", font());
     if (!class_.table->Find("Enabled")) return;
     if (testAttribute(Qt::WA_ForceDisabled))
         put("Enabled", false);
     else if (!designTime())
-        setEnabled(get("Enabled").toBool());
+        setEnabled(controlEnabled());
 }
 
 void ControlWidget::settle() const {
     auto& self = const_cast<ControlWidget&>(*this);
-    if (settled_)
-        self.takeSize();
-    else
-        self.place(nullptr);
+    if (!settled_) return self.place(nullptr);
+    self.takeSize();
+    self.takePlace();
 }
 
 void ControlWidget::ambientChanged(const std::string& name) {
     if (name == "UserMode") site_->surface()->setAttribute(Qt::WA_TransparentForMouseEvents, designTime());
-    if (settled_) enter("AmbientChanged", [&](Site& site) { site.AmbientChanged(name); });
+    if (!settled_) return;
+    const QPointer<ControlWidget> alive = this;
+    enter("AmbientChanged", [&](Site& site) { site.AmbientChanged(name); });
+    if (alive && name == "UserMode" && !designTime() && class_.table->Find("Enabled")) setEnabled(controlEnabled());
 }
 
 // Properties, methods and saved state by name.
@@ -147,7 +150,7 @@ QVariant ControlWidget::call(const char* member, const QVariantList& arguments) 
 }
 
 void ControlWidget::propertyChanged(std::string_view key) {
-    if (key == "Enabled" && !designTime()) setEnabled(get("Enabled").toBool());
+    if (key == "Enabled" && !designTime()) setEnabled(controlEnabled());
 }
 
 QByteArray ControlWidget::bag() const {
@@ -169,6 +172,8 @@ void ControlWidget::setBag(const QByteArray& bag) {
     }
     if (saved || settled_) place(saved ? &*saved : nullptr);
 }
+
+void ControlWidget::setPointer(const QCursor& pointer) { site_->surface()->SetPointer(pointer); }
 
 // Size and place.
 
@@ -215,7 +220,9 @@ void ControlWidget::resizeEvent(QResizeEvent*) {
     if (settled_) followSize();
 }
 
-void ControlWidget::moveEvent(QMoveEvent*) {
+void ControlWidget::moveEvent(QMoveEvent*) { takePlace(); }
+
+void ControlWidget::takePlace() {
     if (!settled_ || pos() == QPoint(Pixels(site_->Left()), Pixels(site_->Top()))) return;
     enter("Move", [&](Site& site) { site.SetPlace(Twips(x()), Twips(y())); });
 }
@@ -262,7 +269,7 @@ void ControlWidget::changeEvent(QEvent* event) {
 void ControlWidget::takeEnabled() {
     if (designTime() || !class_.table->Find("Enabled")) return;
     const bool enabled = isEnabledTo(parentWidget());
-    if (get("Enabled").toBool() != enabled) put("Enabled", enabled);
+    if (controlEnabled() != enabled) setControlEnabled(enabled);
 }
 
 }  // namespace tessel::qt

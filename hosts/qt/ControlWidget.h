@@ -34,6 +34,10 @@ class ControlWidget : public QWidget {
     /// by name, as its siblings reach it.
     frame::Object& extender() const;
 
+    /// The control's own `Enabled`, as it is saved; at design time the widget stays as it is.
+    bool controlEnabled() const { return get("Enabled").toBool(); }
+    void setControlEnabled(bool value) { put("Enabled", value); }
+
     QByteArray bag() const;
     /// A control that was in use already is replaced by a fresh one that is loaded.
     void setBag(const QByteArray& bag);
@@ -73,6 +77,9 @@ class ControlWidget : public QWidget {
     void showEvent(QShowEvent* event) override;
     void hideEvent(QHideEvent* event) override;
 
+    /// The pointer over the control where it asks for none of its own.
+    void setPointer(const QCursor& pointer);
+
     /// Runs a call into the control; its errors are reported as of this member or event.
     template <class F>
     void enter(const char* where, F&& call) const;
@@ -83,8 +90,10 @@ class ControlWidget : public QWidget {
     void adopt();
     void place(const frame::PropertyBag* saved);
     void settle() const;
-    void followFirstLook();
+    enum class Came { New, Loaded };
+    void followFirstLook(Came came);
     void takeSize();
+    void takePlace();
     void takeEnabled();
     bool inLayout() const;
     /// The site has another size or place.

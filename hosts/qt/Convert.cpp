@@ -2,6 +2,7 @@
 
 #include <QApplication>
 #include <QScreen>
+#include <QStringDecoder>
 #include <algorithm>
 #include <cmath>
 #include <cstring>
@@ -27,6 +28,12 @@ double LogicalResolution() {
     return resolution > 0 ? resolution : pixelsPerInch;
 }
 
+/// A byte order mark is a character as any other.
+QString Decoded(std::string_view utf8) {
+    QStringDecoder decoder(QStringDecoder::Utf8, QStringDecoder::Flag::ConvertInitialBom);
+    return decoder.decode(QByteArrayView(utf8.data(), static_cast<qsizetype>(utf8.size())));
+}
+
 bool IsDialogFamily(std::string_view family) {
     const auto is = [&](std::string_view known) { return frame::EqualsNoCase(family, known); };
     return is("MS Sans Serif") || is("MS Shell Dlg") || is("MS Shell Dlg 2") || is("System") || family.empty();
@@ -36,8 +43,8 @@ bool IsDialogFamily(std::string_view family) {
 
 QString ToQt(std::string_view text) {
     if (frame::IsValidUtf8(text) && text.find("\xF4\x8F\xBE") == text.npos && text.find("\xF4\x8F\xBF") == text.npos)
-        return QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size()));
-    return QString::fromStdString(frame::ToStrictUtf8(text));
+        return Decoded(text);
+    return Decoded(frame::ToStrictUtf8(text));
 }
 
 std::string FromQt(const QString& text) { return frame::FromStrictUtf8(text.toStdString()); }
@@ -87,9 +94,9 @@ QImage ToQt(const frame::Picture& picture, double scale) {
     return image;
 }
 
-frame::PictureRef FromQt(const QImage& image, const QString& source) {
+frame::PixelPlane PlaneOf(const QImage& image, double scale) {
     const QImage rgba = image.convertToFormat(QImage::Format_RGBA8888);
-    frame::PixelPlane plane{.scale = image.devicePixelRatio(), .width = rgba.width(), .height = rgba.height(), .pixels = {}};
+    frame::PixelPlane plane{.scale = scale, .width = rgba.width(), .height = rgba.height(), .pixels = {}};
     plane.pixels.reserve(static_cast<std::size_t>(rgba.width()) * static_cast<std::size_t>(rgba.height()));
     for (int y = 0; y < rgba.height(); ++y) {
         const uchar* const line = rgba.constScanLine(y);
@@ -100,8 +107,12 @@ frame::PictureRef FromQt(const QImage& image, const QString& source) {
             plane.pixels.push_back(pixel);
         }
     }
+    return plane;
+}
+
+frame::PictureRef FromQt(const QImage& image, const QString& source) {
     std::vector<frame::PixelPlane> planes;
-    planes.push_back(std::move(plane));
+    planes.push_back(PlaneOf(image, image.devicePixelRatio()));
     return std::make_shared<frame::Picture>(std::move(planes), FromQt(source));
 }
 

@@ -38,6 +38,8 @@ frame::FontRef FromQt(const QFont& font);
 /// The pixels of the plane that suits a screen of this scale; null for a picture without pixels.
 QImage ToQt(const frame::Picture& picture, double scale);
 frame::PictureRef FromQt(const QImage& image, const QString& source);
+/// The pixels of an image as the plane of a scale.
+frame::PixelPlane PlaneOf(const QImage& image, double scale);
 
 /// A value as a Qt program expects it for a member of this type: a colour as `QColor`, a font as `QFont`, an enumeration as
 /// `int`. Invalid for an empty or missing value and for an object without such a form.

@@ -34,17 +34,27 @@ frame::Object& Form::Item(int index) {
 }
 
 void Form::Look() {
-    std::erase_if(members_, [](const Member& member) { return !member.widget || member.widget->objectName().isEmpty(); });
+    std::erase_if(members_, [this](const Member& member) { return !IsOfThisForm(member); });
     LookInto(Live());
+}
+
+/// Not one that has gone or is going, lost its name, or moved to another form.
+bool Form::IsOfThisForm(const Member& member) const {
+    if (!member.widget || member.widget->objectName().isEmpty() || member.widget->isWindow()) return false;
+    if (!member.object && !qobject_cast<ControlWidget*>(member.widget.data())) return false;
+    const QWidget* parent = member.widget->parentWidget();
+    return parent && Host::formOf(const_cast<QWidget*>(parent)) == widget();
 }
 
 void Form::LookInto(const QWidget& parent) {
     for (QObject* child : parent.children()) {
         auto* widget = qobject_cast<QWidget*>(child);
-        if (!widget || widget->isWindow() || Host::formOf(widget) == widget || widget->objectName().startsWith("qt_")) continue;
+        if (!widget || widget->isWindow() || Host::formOf(widget) == widget || widget->objectName().startsWith("qt_tessel_"))
+            continue;
+        const bool inner = widget->objectName().isEmpty() || widget->objectName().startsWith("qt_");
         auto* control = qobject_cast<ControlWidget*>(widget);
         const auto is = [&](const Member& member) { return member.widget == widget; };
-        if (!widget->objectName().isEmpty() && std::none_of(members_.begin(), members_.end(), is))
+        if (!inner && std::none_of(members_.begin(), members_.end(), is))
             members_.push_back({widget, control ? nullptr : std::make_unique<WidgetObject>(*widget)});
         LookInto(*widget);
     }

@@ -34,6 +34,7 @@ class Form final : public QObject, public WidgetObject, public frame::Siblings {
         std::unique_ptr<WidgetObject> object;  // none for a control, which brings its own
     };
 
+    bool IsOfThisForm(const Member& member) const;
     void Look();
     void LookInto(const QWidget& parent);
 

@@ -110,8 +110,8 @@ std::shared_ptr<Host> Host::make(const frame::Services& replaced) {
 
 std::shared_ptr<Host> Host::of(const QWidget* widget) {
     for (const QWidget* at = widget; at; at = at->parentWidget())
-        if (const Holder* holder = HolderOf(at)) return holder->host;
-    if (!HolderOf(qApp)) attach(qApp, make());
+        if (const Holder* holder = HolderOf(at); holder && holder->host) return holder->host;
+    if (const Holder* holder = HolderOf(qApp); !holder || !holder->host) attach(qApp, make());
     return HolderOf(qApp)->host;
 }
 

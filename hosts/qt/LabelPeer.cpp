@@ -99,8 +99,9 @@ QColor LabelWidget::TextColor(const QColor& background) const {
 void LabelWidget::paintEvent(QPaintEvent*) {
     if (!look_.system) return;
     QPainter painter(this);
-    const QColor background = ToQt(look_.back, *look_.system);
-    if (!IsSurroundings(look_.back)) painter.fillRect(rect(), background);
+    const bool shows = IsSurroundings(look_.back);
+    const QColor background = shows ? palette().color(QPalette::Window) : ToQt(look_.back, *look_.system);
+    if (!shows) painter.fillRect(rect(), background);
     QRect inside = rect();
     if (look_.border) {
         if (look_.sunken)

@@ -49,11 +49,13 @@ void LinkWidget::press() {
 
 // As the control's own press does it, in the middle of the label.
 void LinkWidget::pressMiddle() {
+    if (!takesInput()) return;
     child::Label& label = link().Label1;
     label.MouseDownInput(leftButton, noShift, label.Width() / 2, label.Height() / 2);
 }
 
 void LinkWidget::releaseMiddle(bool click) {
+    if (!takesInput()) return;
     const QPointer<LinkWidget> alive = this;
     child::Label& label = link().Label1;
     label.MouseUpInput(leftButton, noShift, label.Width() / 2, label.Height() / 2);
@@ -100,11 +102,15 @@ void LinkWidget::propertyChanged(std::string_view key) {
 
 void LinkWidget::follow() {
     const bool leads = host()->userMode() && link().ClickAction() != controls::ClickActionConstants::Do_nothing;
-    setCursor(leads ? Qt::PointingHandCursor : Qt::ArrowCursor);
+    setPointer(leads ? Qt::PointingHandCursor : Qt::ArrowCursor);
     updateGeometry();
 }
 
+bool LinkWidget::takesInput() const { return isEnabled() && host()->userMode(); }
+
 bool LinkWidget::event(QEvent* event) {
+    // Before a shortcut of the window that copies what is selected there.
+    if (event->type() == QEvent::ShortcutOverride && static_cast<QKeyEvent*>(event)->matches(QKeySequence::Copy)) event->accept();
     const bool result = ControlWidget::event(event);
     // The label covers this widget and shows its own copy of the tool tip.
     if (event->type() == QEvent::ToolTipChange && isVisible()) call("Refresh", {});
@@ -115,7 +121,7 @@ bool LinkWidget::event(QEvent* event) {
 
 void LinkWidget::keyPressEvent(QKeyEvent* event) {
     if (event->matches(QKeySequence::Copy)) return copyTarget();
-    if (!Presses(event->key())) return ControlWidget::keyPressEvent(event);
+    if (!Presses(event->key()) || !takesInput()) return ControlWidget::keyPressEvent(event);
     if (event->isAutoRepeat() || heldKey_ != 0) return;
     heldKey_ = event->key();
     pressMiddle();
@@ -143,6 +149,7 @@ void LinkWidget::focusOutEvent(QFocusEvent* event) {
 }
 
 void LinkWidget::contextMenuEvent(QContextMenuEvent* event) {
+    if (!takesInput()) return ControlWidget::contextMenuEvent(event);
     auto* menu = new QMenu(this);
     menu->setAttribute(Qt::WA_DeleteOnClose);
     QAction* open = menu->addAction(tr("&Open"), this, &LinkWidget::openTarget);
@@ -162,8 +169,8 @@ class AccessibleLink final : public QAccessibleWidget {
     explicit AccessibleLink(LinkWidget& link) : QAccessibleWidget(&link, QAccessible::Link), link_(link) {}
 
     QString text(QAccessible::Text kind) const override {
-        if (kind == QAccessible::Name) return ToQt(link_.link().Caption());
-        if (kind == QAccessible::Description) return link_.target();
+        if (kind == QAccessible::Name && link_.accessibleName().isEmpty()) return ToQt(link_.link().Caption());
+        if (kind == QAccessible::Description && link_.accessibleDescription().isEmpty()) return link_.target();
         return QAccessibleWidget::text(kind);
     }
     // The text is the link's own name, no part that is read again.
@@ -193,6 +200,9 @@ QAccessibleInterface* MakeAccessibleLink(const QString&, QObject* object) {
 LinkWidget::LinkWidget(const frame::ControlClass& controlClass, QWidget* parent) : ControlWidget(controlClass, parent) {
     QAccessible::installFactory(MakeAccessibleLink);
     setFocusPolicy(Qt::TabFocus);
+    connect(host().get(), &Host::userModeChanged, this, [this] {
+        if (isSettled()) follow();
+    });
     setSizePolicy(QSizePolicy::Preferred, QSizePolicy::Preferred);
 }
 

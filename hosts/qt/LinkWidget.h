@@ -48,6 +48,8 @@ class LinkWidget : public ControlWidget {
     void pressMiddle();
     void releaseMiddle(bool click);
     void follow();
+    /// Not while it is disabled, and not at design time.
+    bool takesInput() const;
     QSize textSize(std::optional<float> wrapWidth) const;
 
     class Ring;

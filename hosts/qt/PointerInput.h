@@ -12,9 +12,10 @@ namespace tessel::qt {
 std::int16_t ButtonsOf(Qt::MouseButtons buttons);
 std::int16_t ShiftOf(Qt::KeyboardModifiers modifiers);
 
-/// Reports the mouse over a widget to the child that it shows. A press, its release and the click are MouseDown, MouseUp and
-/// Click; the second press of a double click is DblClick alone, and its release MouseUp alone. A pointer that leaves is reported
-/// as a move to the nearest point of the edge, so that a child which senses the leaving by its edge strip always does.
+/// Reports the mouse over a widget to the child that it shows. A press and its release are MouseDown and MouseUp, and with the left
+/// button over the child Click; the second press of a double click is DblClick alone, and its release MouseUp alone. A pointer that
+/// leaves is reported as a move to the nearest point of the edge, so that a child which senses the leaving by its edge strip always
+/// does.
 ///
 /// An input may end the child and its peer: the peer disconnects this object, which lives as long as the widget.
 class PointerInput {

@@ -18,6 +18,7 @@
 #include "frame/Dates.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/Cursors.h"
+#include "hosts/qt/FileIcons.h"
 #include "hosts/qt/TextLayout.h"
 #include "hosts/qt/WidgetPeer.h"
 
@@ -191,7 +192,7 @@ frame::PictureRef ImageLoader::LoadPicture(const std::string& fileName) {
     return FromQt(image, name);
 }
 
-frame::PictureRef ImageLoader::FileIcon(const std::string&, int) { NotOffered(); }
+frame::PictureRef ImageLoader::FileIcon(const std::string& path, int flags) { return qt::FileIcon(ToQt(path), flags); }
 
 frame::TextSize FontMetrics::Measure(const frame::Font& font, std::string_view text, std::optional<float> wrapWidth) {
     const QSizeF size =

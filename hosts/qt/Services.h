@@ -81,7 +81,6 @@ class UserLocale final : public frame::Locale {
 class ImageLoader final : public frame::PictureLoader {
   public:
     frame::PictureRef LoadPicture(const std::string& fileName) override;
-    /// Error 445: no control on this host asks for it yet.
     frame::PictureRef FileIcon(const std::string& path, int flags) override;
 };
 

@@ -1,6 +1,7 @@
 #include "hosts/qt/Site.h"
 
 #include "frame/Extender.h"
+#include "frame/Text.h"
 #include "hosts/qt/ControlWidget.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/Form.h"
@@ -33,6 +34,10 @@ class Site::WidgetExtender final : public frame::Extender {
             const QVariant index = site_.outer_ ? site_.outer_->property("Index") : QVariant();
             if (!index.isValid()) throw frame::ControlError(frame::errors::noSuchMember);
             return index.toInt();
+        }
+        bool Has(frame::MemberKey key) const override {
+            if (frame::EqualsNoCase(key.Name(), "Index")) return site_.outer_ && site_.outer_->property("Index").isValid();
+            return Object::Has(key);
         }
         const frame::ClassTable& Table() const override {
             static constexpr std::array rows = {

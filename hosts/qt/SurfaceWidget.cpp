@@ -109,13 +109,18 @@ void SurfaceWidget::Show(frame::Control* control, std::function<void()> needsDra
     Follow();
 }
 
+void SurfaceWidget::SetPointer(const QCursor& pointer) {
+    pointer_ = pointer;
+    Follow();
+}
+
 void SurfaceWidget::Follow() {
     if (!control_) return;
     const frame::OwnSurface& surface = control_->Surface();
     if (surface.MousePointer() != 0)
         setCursor(CursorOf(surface.MousePointer(), surface.MouseIcon()));
     else
-        unsetCursor();
+        setCursor(pointer_);
     update();
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QCursor>
 #include <QWidget>
 #include <functional>
 #include <memory>
@@ -43,6 +44,8 @@ class SurfaceWidget final : public QWidget {
     /// The control whose surface is shown; null for none, when its site is no longer in its host. `needsDrawing` is called before
     /// the surface is painted first, and again when it has another size or other colours: what was drawn persists until then.
     void Show(frame::Control* control, std::function<void()> needsDrawing = {});
+    /// The pointer over the surface where the control asks for none of its own.
+    void SetPointer(const QCursor& pointer);
     /// Follows the look of the surface.
     void Follow();
     SurfaceCanvas* canvas = nullptr;  ///< of the control
@@ -54,6 +57,7 @@ class SurfaceWidget final : public QWidget {
 
   private:
     frame::Control* control_ = nullptr;
+    QCursor pointer_;
     std::function<void()> needsDrawing_;
     double drawnFor_ = 0;  // the scale of the screen; 0 when the drawing is out of date
 };

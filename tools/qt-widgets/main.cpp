@@ -173,7 +173,7 @@ class Writer {
 
     void WriteProperty(std::ostream& file, const Member& member) const {
         if (IsOfEveryWidget(member)) {
-            file << "    Q_PROPERTY(bool " << member.name << " READ isEnabled WRITE setEnabled DESIGNABLE false STORED false)\n";
+            file << "    Q_PROPERTY(bool " << member.name << " READ controlEnabled WRITE setControlEnabled DESIGNABLE false STORED false)\n";
             return;
         }
         const std::string lower = Lower(member.name);

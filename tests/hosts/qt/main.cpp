@@ -7,5 +7,6 @@ int main(int count, char** arguments) {
     testing::InitGoogleMock(&count, arguments);
     QApplication program(count, arguments);
     QApplication::setStyle("Fusion");
+    QApplication::setQuitOnLastWindowClosed(false);
     return RUN_ALL_TESTS();
 }

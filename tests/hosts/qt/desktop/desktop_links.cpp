@@ -44,7 +44,9 @@ class Window final : public QWidget {
         else if (words[0] == "clipboard")
             std::cout << "clipboard " << QGuiApplication::clipboard()->text().toStdString() << std::endl;
         else if (words[0] == "cursor" && link)
-            std::cout << "cursor " << (link->cursor().shape() == Qt::PointingHandCursor ? "hand" : "other") << std::endl;
+            std::cout << "cursor "
+                      << (link->childAt(link->rect().center())->cursor().shape() == Qt::PointingHandCursor ? "hand" : "other")
+                      << std::endl;
         else
             std::cout << "what?" << std::endl;
     }
