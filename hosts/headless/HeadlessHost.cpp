@@ -159,7 +159,13 @@ class HeadlessHost::Peers final : public frame::PeerFactory {
     HeadlessHost& host_;
 };
 
-HeadlessHost::HeadlessHost() : peers_(std::make_unique<Peers>(*this)) {
+HeadlessHost::HeadlessHost(frame::FileSystem* otherFiles)
+    : files([this] { return SecondsOf(clock.Now()); }), otherFiles_(otherFiles), peers_(std::make_unique<Peers>(*this)) {
+    shell.carryOut = [this](const frame::FileOperation& operation) {
+        constexpr int notOffered = 120;
+        if (otherFiles_) return frame::FileOperationResult{.code = notOffered, .aborted = false, .systemError = notOffered};
+        return files.Run(operation);
+    };
     host_ = std::make_unique<frame::Host>(LentServices());
     NewForm("Form1");
 }
@@ -178,7 +184,7 @@ frame::Services HeadlessHost::LentServices() {
             .metrics = &metrics,
             .colors = &frame::ClassicColors(),
             .application = &application,
-            .files = &files,
+            .files = otherFiles_ ? otherFiles_ : &files,
             .shell = &shell,
             .clipboard = &clipboard,
             .peers = peers_.get(),

@@ -10,6 +10,7 @@
 #include "frame/Windows1252.h"
 #include "hosts/headless/HostObject.h"
 #include "hosts/headless/Log.h"
+#include "hosts/headless/MemoryDisk.h"
 #include "hosts/headless/Services.h"
 #include "hosts/headless/VirtualClock.h"
 
@@ -97,11 +98,13 @@ class HeadlessForm final : public SurfaceObject, public frame::Siblings {
     std::vector<frame::Handle<Object>> items_;
 };
 
-/// A host without a screen: a virtual clock, boxes that answer by themselves, a shell that carries nothing out, and a log of
-/// all that happened. Everything works the same on every machine.
+/// A host without a screen: a virtual clock, boxes that answer by themselves, a disk in memory on which the shell moves, copies and
+/// deletes, and a log of all that happened. Everything works the same on every machine.
 class HeadlessHost {
   public:
-    HeadlessHost();
+    /// `otherFiles` takes the place of the memory disk, where there is one. The shell then moves, copies and deletes nothing: it
+    /// answers 120, for what a system does not offer.
+    explicit HeadlessHost(frame::FileSystem* otherFiles = nullptr);
     ~HeadlessHost();
 
     frame::Host& Frame() { return *host_; }
@@ -147,7 +150,7 @@ class HeadlessHost {
     NoPictures pictures;
     FixedApplication application;
     MemoryClipboard clipboard;
-    NoDisk files;
+    MemoryDisk files;
     ErrorList errors;
 
     /// Shows the children of what is created from now on; nothing is shown without it.
@@ -163,6 +166,7 @@ class HeadlessHost {
         return std::make_unique<C>(host);
     }
 
+    frame::FileSystem* otherFiles_;
     std::unique_ptr<Peers> peers_;
     std::unique_ptr<frame::Host> host_;
     std::vector<std::unique_ptr<HeadlessForm>> forms_;

@@ -61,6 +61,7 @@ int ScriptedShell::Execute(std::string_view verb, const std::string& target) {
 
 frame::FileOperationResult ScriptedShell::Run(const frame::FileOperation& operation) {
     log_.Add({"operation", static_cast<int>(operation.kind), operation.flags, ListOf(operation.from), ListOf(operation.to)});
+    if (operationResults.empty() && carryOut) return carryOut(operation);
     return TakeFrom(operationResults, frame::FileOperationResult{});
 }
 

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <deque>
+#include <functional>
 #include <map>
 #include <optional>
 #include <random>
@@ -69,7 +70,8 @@ class ScriptedFocus final : public frame::Focus {
     Log& log_;
 };
 
-/// A shell that carries nothing out. Results come from queues; with an empty queue every request succeeds.
+/// A shell that opens and prints nothing. Results come from queues. With an empty queue opening and printing succeed, and an
+/// operation on files is what `carryOut` makes of it; without that it succeeds too.
 class ScriptedShell final : public frame::Shell {
   public:
     explicit ScriptedShell(Log& log) : log_(log) {}
@@ -78,6 +80,7 @@ class ScriptedShell final : public frame::Shell {
 
     std::deque<int> executeResults;
     std::deque<frame::FileOperationResult> operationResults;
+    std::function<frame::FileOperationResult(const frame::FileOperation&)> carryOut;
 
   private:
     Log& log_;
@@ -136,32 +139,6 @@ class MemoryClipboard final : public frame::Clipboard {
 
     std::map<int, std::string> contents;
     bool held = false;  ///< another program holds it
-};
-
-/// A file system without any drive: nothing exists on it and nothing can be written.
-class NoDisk final : public frame::FileSystem {
-  public:
-    char Separator() const override { return '\\'; }
-    bool IgnoresCase() const override { return true; }
-    bool FileExists(std::string_view) override { return false; }
-    bool FolderExists(std::string_view) override { return false; }
-    bool DriveExists(std::string_view) override { return false; }
-    frame::Status Stat(std::string_view, frame::FileRecord&) override { return frame::errors::fileNotFound; }
-    frame::Status List(std::string_view, const std::function<bool(const frame::FileRecord&)>&) override {
-        return frame::errors::pathNotFound;
-    }
-    std::vector<frame::DriveRecord> Drives() override { return {}; }
-    std::string TypeText(std::int32_t) override { return {}; }
-    frame::Status CreateFolder(std::string_view) override { return frame::errors::pathNotFound; }
-    frame::Status Rename(std::string_view, std::string_view) override { return frame::errors::fileNotFound; }
-    frame::Status Delete(std::string_view) override { return frame::errors::fileNotFound; }
-    frame::Status SetAttributes(std::string_view, std::int32_t) override { return frame::errors::fileNotFound; }
-    std::string TemporaryFolder() override { return {}; }
-    std::string SpecialFolder(int) override { return {}; }
-    frame::Status OpenForReading(std::string_view, std::unique_ptr<frame::BinaryFile>&) override {
-        return frame::errors::fileNotFound;
-    }
-    frame::Status WriteOver(std::string_view, std::string_view) override { return frame::errors::pathNotFound; }
 };
 
 /// Where unhandled errors gather.

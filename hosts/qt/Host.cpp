@@ -6,6 +6,7 @@
 
 #include "frame/Control.h"
 #include "frame/Windows1252.h"
+#include "hosts/posix/DiskFileSystem.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/Services.h"
 #include "hosts/qt/Site.h"
@@ -65,6 +66,7 @@ struct Host::Private final : frame::ErrorSink {
     ImageLoader pictures;
     FontMetrics metrics;
     PaletteColors colors;
+    posix::DiskFileSystem files;
     Program application;
     DesktopShell shell;
     Peers peers;
@@ -88,7 +90,7 @@ Host::Host(const frame::Services& replaced) : d(std::make_unique<Private>(*this)
         .metrics = either(replaced.metrics, &d->metrics),
         .colors = either(replaced.colors, &d->colors),
         .application = either(replaced.application, &d->application),
-        .files = replaced.files,
+        .files = either(replaced.files, &d->files),
         .shell = either(replaced.shell, &d->shell),
         .clipboard = either(replaced.clipboard, &d->unoffered),
         .peers = either(replaced.peers, &d->peers),

@@ -8,7 +8,10 @@
 #include "frame/ClassTable.h"
 #include "frame/Dates.h"
 #include "frame/Text.h"
+#include "tools/tessel-host/DiskRequests.h"
+#include "tools/tessel-host/Fields.h"
 #include "tools/tessel-host/ObjectPath.h"
+#include "tools/tessel-host/RealDisk.h"
 
 namespace tessel::tools {
 
@@ -22,53 +25,6 @@ namespace {
 constexpr int deepestRequest = 100;   // requests inside handlers of requests
 constexpr int deepestNesting = 1000;  // brackets inside brackets
 constexpr int mostFields = 1000;      // of one JSON object: they are looked up one by one
-
-[[noreturn]] void Refuse(const std::string& why) { throw ControlError(frame::errors::invalidCall, why); }
-
-const Json* FieldOf(const Json& request, const char* name) {
-    const auto found = request.find(name);
-    return found != request.end() ? &*found : nullptr;
-}
-
-const Json& Required(const Json& request, const char* name) {
-    const Json* field = FieldOf(request, name);
-    if (!field) Refuse(std::string("The request lacks its field \"") + name + "\"");
-    return *field;
-}
-
-std::string TextOf(const Json& json, const char* name) {
-    if (!json.is_string()) Refuse(std::string("\"") + name + "\" must be a string");
-    return frame::FromStrictUtf8(json.get_ref<const std::string&>());
-}
-
-std::string RequiredText(const Json& request, const char* name) { return TextOf(Required(request, name), name); }
-
-/// The name of something new.
-std::string NameIn(const Json& request) {
-    std::string name = RequiredText(request, "name");
-    if (name.empty()) Refuse("\"name\" must not be empty");
-    return name;
-}
-
-const Json& ListIn(const Json& request, const char* name) {
-    static const Json none = Json::array();
-    const Json* field = FieldOf(request, name);
-    if (!field) return none;
-    if (!field->is_array()) Refuse(std::string("\"") + name + "\" must be a list");
-    return *field;
-}
-
-const Json& ObjectIn(const Json& json, const char* name) {
-    if (!json.is_object()) Refuse(std::string("\"") + name + "\" must be an object");
-    return json;
-}
-
-bool FlagIn(const Json& request, const char* name, bool otherwise) {
-    const Json* field = FieldOf(request, name);
-    if (!field) return otherwise;
-    if (!field->is_boolean()) Refuse(std::string("\"") + name + "\" must be true or false");
-    return field->get<bool>();
-}
 
 /// An ambient font is never nothing: null stands for the default one.
 frame::FontRef FontFrom(const Variant& value) {
@@ -137,7 +93,8 @@ class Session::ScreenObject final : public frame::Object {
     headless::FixedApplication& application_;
 };
 
-Session::Session(int mostRequests) : mostRequests_(mostRequests) {
+Session::Session(int mostRequests, DiskKind disk)
+    : realDisk_(disk == DiskKind::Real ? MakeRealDisk() : nullptr), host_(realDisk_.get()), mostRequests_(mostRequests) {
     modules_.push_back(std::make_unique<ApplicationObject>(host_.application));
     modules_.push_back(std::make_unique<ScreenObject>(host_.application));
     finder_.byPath = [this](const std::string& path) { return Find(path); };
@@ -203,7 +160,8 @@ Json Session::Value(const Request& request) {
         {"ambient", &Session::Ambient}, {"get", &Session::Get},         {"put", &Session::Put},
         {"call", &Session::Call},       {"fire", &Session::Fire},       {"handler", &Session::Handle},
         {"advance", &Session::Advance}, {"random", &Session::Random},   {"now", &Session::Now},
-        {"answers", &Session::Answers}, {"shell", &Session::Shell},
+        {"answers", &Session::Answers}, {"shell", &Session::Shell},     {"disk", &Session::Disk},
+        {"special", &Session::Special},
     };
     if (!request.is_object()) Refuse("A request is an object");
     const std::string name = RequiredText(request, "do");
@@ -515,6 +473,23 @@ Json Session::Shell(const Request& request) {
         }
         host_.shell.operationResults.push_back(result);
     }
+    return nullptr;
+}
+
+Json Session::Disk(const Request& request) {
+    if (realDisk_) Refuse("The memory disk is not in use");
+    return CarryOutDisk(host_.files, request, [this](const Json& json) { return From(json); });
+}
+
+Json Session::Special(const Request& request) {
+    const std::string name = RequiredText(request, "name");
+    std::string path = RequiredText(request, "path");
+    const int number = frame::SpecialFolderNumber(name);
+    if (number < 0) Refuse("There is no special folder \"" + name + "\"");
+    if (realDisk_)
+        SetSpecialFolder(*realDisk_, number, std::move(path));
+    else
+        host_.files.SetSpecialFolder(number, std::move(path));
     return nullptr;
 }
 

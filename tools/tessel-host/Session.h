@@ -13,12 +13,15 @@
 
 namespace tessel::tools {
 
+/// What the controls of a session have for a disk.
+enum class DiskKind { Memory, Real };
+
 /// A scripted session with one headless host: requests in, replies out. Nothing that it is given ends the program: what
 /// cannot be understood or done gets an error reply.
 class Session {
   public:
     /// `mostRequests` bounds what one line may set off: the requests inside handlers and forms.
-    explicit Session(int mostRequests = 100'000);
+    explicit Session(int mostRequests = 100'000, DiskKind disk = DiskKind::Memory);
     ~Session();
 
     /// Carries out one line and gives the reply as one line, without its end.
@@ -59,6 +62,8 @@ class Session {
     Json Now(const Request& request);
     Json Answers(const Request& request);
     Json Shell(const Request& request);
+    Json Disk(const Request& request);
+    Json Special(const Request& request);
 
     // Objects.
     frame::ObjectRef Root(std::string_view name);
@@ -80,6 +85,7 @@ class Session {
     void RunAll(const Json& requests);
     void GatherLog();
 
+    std::unique_ptr<frame::FileSystem> realDisk_;  // null with the memory disk
     headless::HeadlessHost host_;
     std::vector<std::unique_ptr<headless::HostObject>> siblings_;
     std::vector<std::unique_ptr<frame::Object>> modules_;

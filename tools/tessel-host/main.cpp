@@ -1,6 +1,7 @@
 #include <fstream>
 #include <iostream>
 #include <string>
+#include <vector>
 
 #include "tools/tessel-host/Lines.h"
 #include "tools/tessel-host/Session.h"
@@ -23,9 +24,10 @@ void KeepEveryByte() {
 #endif
 }
 
-int Run(std::istream& input) {
+int Run(std::istream& input, tessel::tools::DiskKind disk) {
     using tessel::tools::LineRead;
-    tessel::tools::Session session;
+    constexpr int mostRequests = 100'000;
+    tessel::tools::Session session(mostRequests, disk);
     std::string line;
     while (true) {
         const LineRead read = tessel::tools::ReadLine(input, line);
@@ -37,19 +39,35 @@ int Run(std::istream& input) {
 
 }  // namespace
 
-/// tessel-host [file]: reads requests, one JSON object a line, from the file or from standard input.
+/// tessel-host [--disk memory|real] [file]: reads requests, one JSON object a line, from the file or from standard input.
 int main(int count, char** arguments) {
     KeepEveryByte();
+    using tessel::tools::DiskKind;
     std::ios::sync_with_stdio(false);
-    if (count > 2 || (count == 2 && arguments[1][0] == '-')) {
-        std::cerr << "usage: tessel-host [file]\n";
+    const auto usage = [] {
+        std::cerr << "usage: tessel-host [--disk memory|real] [file]\n";
         return usageError;
+    };
+    DiskKind disk = DiskKind::Memory;
+    std::vector<std::string> files;
+    for (int i = 1; i < count; ++i) {
+        const std::string argument = arguments[i];
+        if (argument == "--disk") {
+            const std::string kind = i + 1 < count ? arguments[++i] : "";
+            if (kind != "memory" && kind != "real") return usage();
+            disk = kind == "real" ? DiskKind::Real : DiskKind::Memory;
+        } else if (argument.starts_with('-')) {
+            return usage();
+        } else {
+            files.push_back(argument);
+        }
     }
-    if (count == 1) return Run(std::cin);
-    std::ifstream file(arguments[1], std::ios::binary);
+    if (files.size() > 1) return usage();
+    if (files.empty()) return Run(std::cin, disk);
+    std::ifstream file(files.front(), std::ios::binary);
     if (!file) {
-        std::cerr << "tessel-host: cannot read " << arguments[1] << '\n';
+        std::cerr << "tessel-host: cannot read " << files.front() << '\n';
         return usageError;
     }
-    return Run(file);
+    return Run(file, disk);
 }

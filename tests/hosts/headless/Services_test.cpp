@@ -336,17 +336,6 @@ TEST(MemoryClipboard, ThatAnotherProgramHoldsGivesAndTakesNothing) {
     EXPECT_EQ(clipboard.Read(1), "text");
 }
 
-TEST(NoDisk, HasNothingAndTakesNothing) {
-    NoDisk disk;
-    frame::FileRecord record;
-    EXPECT_FALSE(disk.FileExists("C:\\a.txt") || disk.FolderExists("C:\\") || disk.DriveExists("C:\\"));
-    EXPECT_EQ(disk.Stat("C:\\a.txt", record).Number(), frame::errors::fileNotFound);
-    EXPECT_TRUE(disk.List("C:\\", [](const frame::FileRecord&) { return true; }).Failed());
-    EXPECT_TRUE(disk.CreateFolder("C:\\a").Failed());
-    EXPECT_TRUE(disk.WriteOver("C:\\a", "x").Failed());
-    EXPECT_TRUE(disk.Drives().empty());
-}
-
 TEST(ErrorList, KeepsEveryReport) {
     ErrorList errors;
     errors.Unhandled(frame::ControlError(13), "A.Click");

@@ -228,9 +228,16 @@ def test_a_file_is_read_in_place_of_the_input():
         assert run("{}", path) == (0, b'{"value":"Link1","log":[]}\n', b"")
 
 
+def test_the_disk_is_chosen_on_the_command_line():
+    listing = '{"do":"disk","list":"C:\\\\"}\n'
+    for arguments in ([], ["--disk", "memory"]):
+        assert json.loads(run(listing, *arguments)[1])["value"][0]["path"] == "C:\\Temp", arguments
+    assert json.loads(run(listing, "--disk", "real")[1])["error"]["number"] == 5
+
+
 def test_a_missing_file_and_a_wrong_command_line_end_with_code_2():
     with tempfile.TemporaryDirectory() as folder:
-        for arguments in ([os.path.join(folder, "missing")], ["--unknown"], ["one", "two"]):
+        for arguments in ([os.path.join(folder, "missing")], ["--unknown"], ["one", "two"], ["--disk"], ["--disk", "floppy"]):
             code, output, errors = run("", *arguments)
             assert code == 2 and output == b"" and errors, (arguments, code, output, errors)
 
