@@ -147,7 +147,7 @@ class HeadlessHost {
     FixedLocale locale;
     frame::Windows1252 codePage;
     FixedMetrics metrics;
-    NoPictures pictures;
+    ScriptedPictures pictures{log, files};
     FixedApplication application;
     MemoryClipboard clipboard;
     MemoryDisk files;

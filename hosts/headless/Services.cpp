@@ -8,6 +8,7 @@
 #include "frame/ChildControl.h"
 #include "frame/Dates.h"
 #include "frame/Text.h"
+#include "hosts/headless/MemoryDisk.h"
 
 namespace tessel::headless {
 
@@ -153,12 +154,29 @@ frame::TextSize FixedMetrics::Measure(const frame::Font&, std::string_view text,
     return {static_cast<float>(widest) * characterWidth, static_cast<float>(lengths.size()) * lineHeight};
 }
 
-frame::PictureRef NoPictures::LoadPicture(const std::string& fileName) {
+frame::PictureRef ScriptedPictures::LoadPicture(const std::string& fileName) {
     if (fileName.empty()) return std::make_shared<frame::Picture>();
-    throw frame::ControlError(frame::errors::fileNotFound);
+    if (!disk_.FileExists(fileName)) throw frame::ControlError(frame::errors::fileNotFound);
+    const auto size = disk_.PictureSize(fileName);
+    if (!size) throw frame::ControlError(frame::errors::invalidPicture);
+    return std::make_shared<frame::Picture>(size->first, size->second, fileName);
 }
 
-frame::PictureRef NoPictures::FileIcon(const std::string&, int) { return nullptr; }
+frame::PictureRef ScriptedPictures::FileIcon(const std::string& path, int flags) {
+    log_.Add({"icon", path, flags});
+    bool known = true;
+    if (!icons.empty()) {
+        known = icons.front();
+        icons.pop_front();
+    }
+    if (!known) return nullptr;
+    constexpr int smallForm = 1;
+    const int side = flags & smallForm ? 16 : 32;
+    constexpr std::uint32_t blue = 0xFFFF0000;
+    const auto pixels = static_cast<std::size_t>(side) * static_cast<std::size_t>(side);
+    std::vector<frame::PixelPlane> planes{{1, side, side, std::vector<std::uint32_t>(pixels, blue)}};
+    return std::make_shared<frame::Picture>(std::move(planes), path);
+}
 
 void MemoryClipboard::Clear() {
     if (!held) contents.clear();

@@ -14,6 +14,8 @@
 /// The small services of the headless host. Each writes what it was asked into the log.
 namespace tessel::headless {
 
+class MemoryDisk;
+
 class ScriptedLoop final : public frame::MessageLoop {
   public:
     explicit ScriptedLoop(Log& log) : log_(log) {}
@@ -114,10 +116,20 @@ class FixedMetrics final : public frame::TextMetrics {
     frame::TextSize Measure(const frame::Font& font, std::string_view text, std::optional<float> wrapWidth) override;
 };
 
-class NoPictures final : public frame::PictureLoader {
+/// Pictures of which the memory disk knows the size, and icons: one and the same small picture for every path, unless a queue says
+/// that there is none.
+class ScriptedPictures final : public frame::PictureLoader {
   public:
+    ScriptedPictures(Log& log, MemoryDisk& disk) : log_(log), disk_(disk) {}
+    /// Error 481 for a file that has no picture.
     frame::PictureRef LoadPicture(const std::string& fileName) override;
     frame::PictureRef FileIcon(const std::string& path, int flags) override;
+
+    std::deque<bool> icons;  ///< whether the system has an icon for the next path asked; true when the queue is empty
+
+  private:
+    Log& log_;
+    MemoryDisk& disk_;
 };
 
 class FixedApplication final : public frame::Application {

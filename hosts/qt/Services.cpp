@@ -108,10 +108,6 @@ void WidgetDialogs::ShowModal(frame::Object&) { NotOffered(); }
 
 void Unoffered::Popup(frame::Object&, frame::Object*) { NotOffered(); }
 void Unoffered::Start(frame::ChildControl&) { NotOffered(); }
-void Unoffered::Clear() { NotOffered(); }
-bool Unoffered::Has(int) { NotOffered(); }
-bool Unoffered::Put(int, std::string) { NotOffered(); }
-std::optional<std::string> Unoffered::Read(int) { NotOffered(); }
 
 void WidgetFocus::Set(frame::ChildControl& child) {
     if (const auto* peer = dynamic_cast<WidgetPeer*>(child.Peer())) peer->widget()->setFocus(Qt::OtherFocusReason);

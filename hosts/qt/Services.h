@@ -32,15 +32,15 @@ class WidgetDialogs final : public frame::Dialogs {
     void ShowModal(frame::Object& form) override;
 };
 
-/// What no control on this host asks for yet: error 445.
+/// What no control on this host asks for yet. Menus and drags are error 445; the clipboard is as one that another program holds.
 class Unoffered final : public frame::Menus, public frame::DragAndDrop, public frame::Clipboard {
   public:
     void Popup(frame::Object& menu, frame::Object* defaultEntry) override;
     void Start(frame::ChildControl& source) override;
-    void Clear() override;
-    bool Has(int format) override;
-    bool Put(int format, std::string bytes) override;
-    std::optional<std::string> Read(int format) override;
+    void Clear() override {}
+    bool Has(int /*format*/) override { return false; }
+    bool Put(int /*format*/, std::string /*bytes*/) override { return false; }
+    std::optional<std::string> Read(int /*format*/) override { return std::nullopt; }
 };
 
 class WidgetFocus final : public frame::Focus {

@@ -67,12 +67,17 @@ bool IsFont(const Json& json) {
 }
 
 Variant ObjectFrom(const Json& json, const ObjectFinder& finder, int depth) {
-    const auto named = [&](const char* key) { return json.size() == 1 && json.contains(key); };
-    if (named("missing")) return Variant::Missing();
-    if (named("object") && json["object"].is_string())
-        return finder.byPath(frame::FromStrictUtf8(json["object"].get<std::string>()));
-    if (named("picture") && json["picture"].is_string())
-        return finder.picture(frame::FromStrictUtf8(json["picture"].get<std::string>()));
+    if (json.size() == 1) {
+        const std::string& key = json.begin().key();
+        const Json& value = json.begin().value();
+        if (key == "missing") return Variant::Missing();
+        const auto* find = key == "object"    ? &finder.byPath
+                           : key == "picture" ? &finder.picture
+                           : key == "drive"   ? &finder.drive
+                           : key == "folder"  ? &finder.folder
+                                              : nullptr;
+        if (find && value.is_string()) return (*find)(frame::FromStrictUtf8(value.get<std::string>()));
+    }
     if (!IsFont(json)) throw ControlError(frame::errors::typeMismatch);
     const auto font = std::make_shared<frame::Font>();
     for (const auto& entry : json.items()) font->Put(entry.key(), ValueFrom(entry.value(), finder, depth + 1));

@@ -18,8 +18,10 @@ Json ToJson(const frame::Variant& value);
 
 /// What `FromJson` asks about objects.
 struct ObjectFinder {
-    std::function<frame::ObjectRef(const std::string& path)> byPath;
-    std::function<frame::ObjectRef(const std::string& file)> picture;
+    std::function<frame::ObjectRef(const std::string& path)> byPath = {};
+    std::function<frame::ObjectRef(const std::string& file)> picture = {};
+    std::function<frame::ObjectRef(const std::string& name)> drive = {};
+    std::function<frame::ObjectRef(const std::string& path)> folder = {};
 };
 
 /// The value of a piece of JSON. Whole numbers take the least of 16 bits, 32 bits and a float that holds them.

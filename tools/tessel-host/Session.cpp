@@ -5,6 +5,12 @@
 #include <cmath>
 
 #include "controls/Classes.h"
+#include "fileservices/Collect.h"
+#include "fileservices/CommonFile.h"
+#include "fileservices/FileIcon.h"
+#include "fileservices/FileSys.h"
+#include "fileservices/FileSystemObject.h"
+#include "fileservices/SpecialFolders.h"
 #include "frame/ClassTable.h"
 #include "frame/Dates.h"
 #include "frame/Text.h"
@@ -97,6 +103,14 @@ Session::Session(int mostRequests, DiskKind disk)
     : realDisk_(disk == DiskKind::Real ? MakeRealDisk() : nullptr), host_(realDisk_.get()), mostRequests_(mostRequests) {
     modules_.push_back(std::make_unique<ApplicationObject>(host_.application));
     modules_.push_back(std::make_unique<ScreenObject>(host_.application));
+    frame::Host& frame = host_.Frame();
+    sharedModules_ = {&frame.Module<fileservices::CommonFile>(), &frame.Module<fileservices::FileSys>(),
+                      &frame.Module<fileservices::Collect>(),    &frame.Module<fileservices::SpecialFolders>(),
+                      &frame.Module<fileservices::FileIcon>(),   &frame.Module<fileservices::FileSystemObject>()};
+    finder_.drive = [this](const std::string& name) {
+        return frame::ObjectRef(host_.Frame().Module<fileservices::FileSystemObject>().GetDrive(name));
+    };
+    finder_.folder = [this](const std::string& path) { return FolderAt(path); };
     finder_.byPath = [this](const std::string& path) { return Find(path); };
     finder_.picture = [this](const std::string& file) { return frame::ObjectRef(host_.Frame().Pictures().LoadPicture(file)); };
 }
@@ -473,6 +487,7 @@ Json Session::Shell(const Request& request) {
         }
         host_.shell.operationResults.push_back(result);
     }
+    for (const Json& known : ListIn(request, "icon")) host_.pictures.icons.push_back(From(known).ToBoolean());
     return nullptr;
 }
 
@@ -500,7 +515,16 @@ frame::ObjectRef Session::Root(std::string_view name) {
     if (auto* form = host_.FindForm(name)) return frame::ObjectRef(*form);
     for (const auto& module : modules_)
         if (EqualsNoCase(module->Path(), name)) return frame::ObjectRef(*module);
+    for (frame::Object* module : sharedModules_)
+        if (EqualsNoCase(module->Path(), name)) return frame::ObjectRef(*module);
     return {};
+}
+
+/// A folder by its path, whether it is there or not: routines are asked about what has gone too.
+frame::ObjectRef Session::FolderAt(const std::string& path) {
+    const auto& files = host_.Frame().Module<fileservices::FileSystemObject>();
+    if (files.FolderExists(path)) return frame::ObjectRef(files.GetFolder(path));
+    return frame::ObjectRef(std::make_shared<fileservices::Folder>(host_.Frame(), path));
 }
 
 frame::ObjectRef Session::Find(const std::string& path) {

@@ -67,6 +67,7 @@ class Session {
 
     // Objects.
     frame::ObjectRef Root(std::string_view name);
+    frame::ObjectRef FolderAt(const std::string& path);
     frame::ObjectRef Find(const std::string& path);
     /// The object that a request names. To be held while it is used: a value-like object lives only as long as someone does.
     frame::ObjectRef Target(const Request& request);
@@ -89,6 +90,7 @@ class Session {
     headless::HeadlessHost host_;
     std::vector<std::unique_ptr<headless::HostObject>> siblings_;
     std::vector<std::unique_ptr<frame::Object>> modules_;
+    std::vector<frame::Object*> sharedModules_;                 // those that the controls of the host share
     std::map<std::string, std::shared_ptr<Handler>> handlers_;  // by object and event, in lower case
     ObjectFinder finder_;
     Json log_ = Json::array();

@@ -306,11 +306,29 @@ TEST_F(Metrics, WrapNothingInAWidthWithoutEnd) {
 
 // What holds nothing
 
-TEST(NoPictures, LoadsOnlyTheEmptyPicture) {
-    NoPictures pictures;
-    EXPECT_EQ(pictures.LoadPicture("")->Width(), 0);
-    EXPECT_EQ(ErrorOf([&] { pictures.LoadPicture("a.bmp"); }), frame::errors::fileNotFound);
-    EXPECT_EQ(pictures.FileIcon("C:\\a.txt", 0), nullptr);
+TEST(ScriptedPictures, LoadWhatTheMemoryDiskKnowsAsAPicture) {
+    HeadlessHost host;
+    host.files.SetFile("C:\\p.bmp", {.picture = std::pair(1500.0f, 900.0f)}).Check();
+    host.files.SetFile("C:\\a.txt", {.contents = "words"}).Check();
+    const auto picture = host.pictures.LoadPicture("C:\\p.bmp");
+    EXPECT_EQ(picture->Width(), 1500);
+    EXPECT_EQ(picture->Height(), 900);
+    EXPECT_EQ(picture->Source(), "C:\\p.bmp");
+    EXPECT_EQ(host.pictures.LoadPicture("")->Width(), 0);
+    EXPECT_EQ(ErrorOf([&] { host.pictures.LoadPicture("C:\\none.bmp"); }), frame::errors::fileNotFound);
+    EXPECT_EQ(ErrorOf([&] { host.pictures.LoadPicture("C:\\a.txt"); }), frame::errors::invalidPicture);
+}
+
+TEST(ScriptedPictures, HaveAnIconForEveryPathUnlessTheQueueSaysOtherwise) {
+    HeadlessHost host;
+    host.pictures.icons = {false, true};
+    EXPECT_EQ(host.pictures.FileIcon("C:\\a.txt", 0x6605), nullptr);
+    const auto large = host.pictures.FileIcon("C:\\a.txt", 0x6604);
+    const auto small = host.pictures.FileIcon("C:\\a.txt", 0x6605);
+    ASSERT_TRUE(large && small);
+    EXPECT_EQ(large->Width(), 480);
+    EXPECT_EQ(small->Width(), 240);
+    EXPECT_THAT(Lines(host.log), ElementsAre("icon|C:\\a.txt|26117", "icon|C:\\a.txt|26116", "icon|C:\\a.txt|26117"));
 }
 
 TEST(MemoryClipboard, KeepsBytesByTheirFormat) {
