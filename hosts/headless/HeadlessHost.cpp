@@ -5,6 +5,7 @@
 #include "frame/ClassTable.h"
 #include "frame/Extender.h"
 #include "frame/Text.h"
+#include "frame/child/ListView.h"
 
 namespace tessel::headless {
 
@@ -144,12 +145,27 @@ class HeadlessHost::LoggingCanvas final : public frame::Canvas {
     frame::Object& owner_;
 };
 
+/// Tells of label edits that open; the list's own fixed rule answers for the screen.
+class HeadlessHost::EditLogger final : public child::ListViewPeer {
+  public:
+    EditLogger(Log& log, child::ListView& list) : log_(log), list_(list) {}
+    void Update() override {}
+    child::ListScreen* Screen() override { return nullptr; }
+    void EditBegan(child::RowId) override { log_.Add({"edit", list_.Path()}); }
+
+  private:
+    Log& log_;
+    child::ListView& list_;
+};
+
 /// Children are shown where a program asks for it; every surface is logged.
 class HeadlessHost::Peers final : public frame::PeerFactory {
   public:
     explicit Peers(HeadlessHost& host) : host_(host) {}
     std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl& child) override {
-        return host_.makePeer ? host_.makePeer(child) : nullptr;
+        if (host_.makePeer) return host_.makePeer(child);
+        if (auto* list = dynamic_cast<child::ListView*>(&child)) return std::make_unique<EditLogger>(host_.log, *list);
+        return nullptr;
     }
     std::unique_ptr<frame::Canvas> MakeCanvas(frame::DrawingSurface&, frame::Object& owner) override {
         return std::make_unique<LoggingCanvas>(host_.log, owner);

@@ -158,6 +158,7 @@ class HeadlessHost {
 
   private:
     friend class HeadlessSite;
+    class EditLogger;
     class LoggingCanvas;
     class Peers;
 

@@ -10,6 +10,7 @@
 
 #include "controls/link/Link.h"
 #include "tests/frame/TestControl.h"
+#include "tests/frame/child/ListOwner.h"
 
 namespace tessel::headless {
 namespace {
@@ -399,6 +400,17 @@ TEST(HostObject, ReachesTheObjectThatAMemberHolds) {
     EXPECT_EQ(object.Inner("FONT").Get(), font.get());
     EXPECT_TRUE(object.Inner("Text").IsNothing());
     EXPECT_TRUE(object.Inner("Picture").IsNothing());
+}
+
+TEST(HeadlessHostLists, LabelEditThatOpensIsLogged) {
+    HeadlessHost host;
+    auto& owner = host.Create<test::ListOwner>("Owner1");
+    owner.list.Items().Add("a");
+    owner.list.SetSelectedItem(owner.list.ListItems.Item(1));
+    owner.list.StartLabelEdit();
+    ASSERT_EQ(host.log.Of("edit").size(), 1u);
+    EXPECT_EQ(host.log.Of("edit")[0][1].ToText(), owner.list.Path());
+    EXPECT_TRUE(owner.list.Editing());
 }
 
 }  // namespace
