@@ -9,7 +9,7 @@ class LabelWidget;
 
 /// Shows a label. Text in a fixed colour over a background that follows the palette is lightened on a dark palette until it can
 /// be read; the label's own colours stay as they are.
-class LabelPeer final : public WidgetPeer {
+class LabelPeer final : public frame::Peer, public WidgetPeer {
   public:
     explicit LabelPeer(child::Label& label);
     ~LabelPeer() override;

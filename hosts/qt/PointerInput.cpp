@@ -34,12 +34,20 @@ void PointerInput::Move(const QMouseEvent& event) {
 }
 
 void PointerInput::Release(const QMouseEvent& event) {
-    if (!child_ || !(held_ & event.button())) return;
+    if (ReleaseAlone(event)) Click();
+}
+
+bool PointerInput::ReleaseAlone(const QMouseEvent& event) {
+    if (!child_ || !(held_ & event.button())) return false;
     held_ &= ~Qt::MouseButtons(event.button());
     const bool clicks = event.button() == Qt::LeftButton && !doubleClicked_ && widget_.rect().contains(event.position().toPoint());
     child_->MouseUpInput(ButtonsOf(event.button()), ShiftOf(event.modifiers()), Twips(event.position().x()),
                          Twips(event.position().y()));
-    if (clicks && child_) child_->ClickInput();
+    return clicks && child_;
+}
+
+void PointerInput::Click() {
+    if (child_) child_->ClickInput();
 }
 
 void PointerInput::DoubleClick(const QMouseEvent& event) {

@@ -27,6 +27,9 @@ class PointerInput {
     void Press(const QMouseEvent& event);
     void Move(const QMouseEvent& event);
     void Release(const QMouseEvent& event);
+    /// The two halves of it: MouseUp, and whether a click follows; then the click.
+    bool ReleaseAlone(const QMouseEvent& event);
+    void Click();
     void DoubleClick(const QMouseEvent& event);
     void Leave();
 

@@ -2,9 +2,13 @@
 
 #include "frame/Control.h"
 #include "frame/child/Label.h"
+#include "frame/child/ListView.h"
+#include "frame/child/TextBox.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/LabelPeer.h"
+#include "hosts/qt/ListViewPeer.h"
 #include "hosts/qt/Site.h"
+#include "hosts/qt/TextBoxPeer.h"
 
 namespace tessel::qt {
 
@@ -30,6 +34,8 @@ void WidgetPeer::FollowChild() {
 
 std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl& child) {
     if (auto* label = dynamic_cast<child::Label*>(&child)) return std::make_unique<LabelPeer>(*label);
+    if (auto* list = dynamic_cast<child::ListView*>(&child)) return std::make_unique<ListViewPeer>(*list);
+    if (auto* text = dynamic_cast<child::TextBox*>(&child)) return std::make_unique<TextBoxPeer>(*text);
     return nullptr;
 }
 

@@ -8,16 +8,18 @@
 
 namespace tessel::qt {
 
-/// The base of peers that show a child as a widget: it stands on the surface of the child's site, and goes later, unseen and
+/// The part of a peer that shows its child as a widget: that stands on the surface of the child's site, and goes later, unseen and
 /// deaf, since an event of its own may be on the stack when the peer ends.
-class WidgetPeer : public frame::Peer {
+class WidgetPeer {
   public:
     QWidget* widget() const { return widget_; }
 
   protected:
     /// Shows the widget as a part of the child's control, under the child's name.
     WidgetPeer(frame::ChildControl& child, QWidget* widget);
-    ~WidgetPeer() override;
+    WidgetPeer(const WidgetPeer&) = delete;
+    WidgetPeer& operator=(const WidgetPeer&) = delete;
+    virtual ~WidgetPeer();
     /// Follows what every child has: place, size, visibility, whether it is enabled, tool tip.
     void FollowChild();
 
