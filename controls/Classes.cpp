@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 
+#include "controls/fileview/FileView.h"
 #include "controls/link/Link.h"
 #include "frame/Text.h"
 
@@ -14,7 +15,7 @@ template <class C>
 constexpr frame::ControlClass classOf{
     &C::table, [](frame::Host& host) -> std::unique_ptr<frame::Control> { return std::make_unique<C>(host); }};
 
-constexpr std::array classes = {classOf<Link>};
+constexpr std::array classes = {classOf<FileView>, classOf<Link>};
 
 }  // namespace
 

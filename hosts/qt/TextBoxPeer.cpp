@@ -6,6 +6,7 @@
 #include <QPlainTextEdit>
 #include <QTextBlock>
 #include <algorithm>
+#include <utility>
 
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/KeyInput.h"
@@ -41,7 +42,9 @@ class TextBoxWidget final : public QFrame {
     QPlainTextEdit* lines_ = nullptr;
     QWidget* pressed_ = nullptr;  // what gets the mouse: the edit, or the inside of one with several lines
     bool following_ = false;
-    std::string reported_;  // the text when it was last the same here and there
+    enum class Swap { None, Asked, Now };
+    Swap swap_ = Swap::None;  // of the edit for one of the other kind, while nothing is seen
+    std::string reported_;    // the text when it was last the same here and there
 };
 
 TextBoxWidget::TextBoxWidget(child::TextBox& box) : box_(&box), pointer_(box, *this), keys_(new KeyInput(box, this)) {
@@ -60,6 +63,19 @@ void TextBoxWidget::TakeEdit() {
     const bool wantsLines = box_->MultiLine();
     if (line_ || lines_) {
         if (wantsLines == (lines_ != nullptr)) return;
+        // A window that is being destroyed hides what stands on it, and takes no new widgets then.
+        if (!isVisible() && swap_ != Swap::Now) {
+            if (std::exchange(swap_, Swap::Asked) == Swap::Asked) return;
+            QMetaObject::invokeMethod(
+                this,
+                [this] {
+                    swap_ = Swap::Now;
+                    Follow();
+                    swap_ = Swap::None;
+                },
+                Qt::QueuedConnection);
+            return;
+        }
         // What goes may be the sender of an event that is on the stack.
         QWidget* const leaving = lines_ ? static_cast<QWidget*>(lines_) : line_;
         leaving->removeEventFilter(this);

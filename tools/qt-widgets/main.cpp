@@ -21,6 +21,12 @@ std::string Lower(std::string_view name) {
     return result;
 }
 
+std::string Upper(std::string_view name) {
+    std::string result(name);
+    if (!result.empty() && result[0] >= 'a' && result[0] <= 'z') result[0] = static_cast<char>(result[0] - 'a' + 'A');
+    return result;
+}
+
 /// How a value is given in C++ to those who use Qt.
 struct QtType {
     std::string name;
@@ -73,6 +79,8 @@ std::string StorageOf(const TypeInfo& type) {
             return "double";
         case VarType::String:
             return "std::string";
+        case VarType::Object:
+            return "tessel::child::DragDataRef";  // the one object that events bring
         default:
             return "tessel::frame::Variant";
     }
@@ -122,7 +130,7 @@ class Writer {
             if (IsOfEveryWidget(*member)) continue;
             const QtType type = TypeOf(*member);
             file << "    /// " << member->help << "\n    " << type.name << " " << Lower(member->name) << "() const;\n";
-            if (member->set) file << "    void set" << member->name << "(" << type.parameter << " value);\n";
+            if (member->set) file << "    void set" << Upper(member->name) << "(" << type.parameter << " value);\n";
         }
         if (!methods_.empty()) file << "\n  public slots:\n";
         for (const Member* member : methods_)
@@ -151,8 +159,8 @@ class Writer {
             file << (member->type.enumeration ? name_ + "::" : "") << type.name << " " << name_ << "::" << Lower(member->name)
                  << "() const { return " << value << "; }\n";
             if (member->set)
-                file << "void " << name_ << "::set" << member->name << "(" << type.parameter << " value) { put(\"" << member->name
-                     << "\", " << AsVariant("value", type) << "); }\n";
+                file << "void " << name_ << "::set" << Upper(member->name) << "(" << type.parameter << " value) { put(\""
+                     << member->name << "\", " << AsVariant("value", type) << "); }\n";
         }
         for (const Member* member : methods_) WriteMethod(file, *member);
         WriteEvents(file);
@@ -173,27 +181,33 @@ class Writer {
 
     void WriteProperty(std::ostream& file, const Member& member) const {
         if (IsOfEveryWidget(member)) {
-            file << "    Q_PROPERTY(bool " << member.name << " READ controlEnabled WRITE setControlEnabled DESIGNABLE false STORED false)\n";
+            file << "    Q_PROPERTY(bool " << member.name
+                 << " READ controlEnabled WRITE setControlEnabled DESIGNABLE false STORED false)\n";
             return;
         }
         const std::string lower = Lower(member.name);
-        const std::string write = member.set ? " WRITE set" + std::string(member.name) : "";
+        const std::string write = member.set ? " WRITE set" + Upper(member.name) : "";
         const std::string notify = Notifies(member) ? " NOTIFY " + lower + "Changed" : "";
-        file << "    Q_PROPERTY(" << TypeOf(member).name << " " << lower << " READ " << lower << write << notify
-             << " STORED false)\n"
-             << "    Q_PROPERTY(" << TypeOf(member).name << " " << member.name << " READ " << lower << write << notify
-             << " DESIGNABLE false STORED false)\n";
+        const std::string rest = " READ " + lower + write + notify;
+        file << "    Q_PROPERTY(" << TypeOf(member).name << " " << lower << rest << " STORED false)\n";
+        if (lower == member.name) return;
+        file << "    Q_PROPERTY(" << TypeOf(member).name << " " << member.name << rest << " DESIGNABLE false STORED false)\n";
     }
 
     void WriteEnumerations(std::ostream& file) const {
         std::map<std::string_view, const Enumeration*> used;
         for (const Member* member : properties_)
             if (member->type.enumeration) used.emplace(member->type.enumeration->name, member->type.enumeration);
+        std::map<std::string_view, int> uses;
+        for (const auto& [name, enumeration] : used)
+            for (const Enumeration::Constant& constant : enumeration->constants) ++uses[constant.name];
         for (const auto& [name, enumeration] : used) {
+            // A designer wants the constants in the class itself: one that two enumerations have tells whose it is.
+            const std::string prefix(name.substr(0, name.rfind("Constants")));
             file << "    enum " << name << " : int {";
             const char* separator = " ";
             for (const Enumeration::Constant& constant : enumeration->constants) {
-                file << separator << constant.name << " = " << constant.value;
+                file << separator << (uses[constant.name] > 1 ? prefix : "") << constant.name << " = " << constant.value;
                 separator = ", ";
             }
             file << " };\n    Q_ENUM(" << name << ")\n";

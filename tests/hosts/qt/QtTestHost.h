@@ -12,6 +12,7 @@
 #include "frame/Text.h"
 #include "hosts/headless/HeadlessHost.h"
 #include "hosts/qt/Convert.h"
+#include "hosts/qt/FileView.h"
 #include "hosts/qt/Form.h"
 #include "hosts/qt/Host.h"
 #include "hosts/qt/Link.h"
@@ -168,6 +169,7 @@ class QtTestHost {
         return controls::FindControlClass(C::table.name);
     }
     ControlWidget& Make(const frame::ControlClass& controlClass, const headless::Placing& placing) {
+        if (controlClass.table->name == "FileView") return Placed<FileView>(placing);
         if (controlClass.table->name == "Link") return Placed<Link>(placing);
         throw frame::ControlError(frame::errors::notSupported);
     }
