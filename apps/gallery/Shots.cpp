@@ -19,7 +19,6 @@ int TakeShots(const QString& folder) {
     for (const auto& [scheme, name] : {std::pair(Scheme::Light, "light"), std::pair(Scheme::Dark, "dark")}) {
         Follow(scheme);
         Window window;
-        window.setAttribute(Qt::WA_DontShowOnScreen);
         window.show();
         for (qsizetype i = 0; i < window.pages().size(); ++i) {
             Page* page = window.pages()[i];
