@@ -41,6 +41,8 @@ class Window final : public QWidget {
             std::cout << "open " << link->openLink().toStdString() << std::endl;
         else if (words[0] == "focus")
             std::cout << "focus " << (focusWidget() ? focusWidget()->objectName().toStdString() : "") << std::endl;
+        else if (words[0] == "popup")
+            std::cout << "popup " << (QApplication::activePopupWidget() ? "open" : "none") << std::endl;
         else if (words[0] == "clipboard")
             std::cout << "clipboard " << QGuiApplication::clipboard()->text().toStdString() << std::endl;
         else if (words[0] == "cursor" && link)

@@ -270,7 +270,7 @@ class Desktop(unittest.TestCase):
     def test_context_menu_copies_by_keyboard(self):
         self.focus("web")
         self.tool("key", "Menu")
-        time.sleep(0.3)  # the menu takes the keyboard
+        wait_for("the menu", lambda: self.ask("popup") == "open")
         self.tool("key", "c")
         wait_for("the copy", lambda: self.ask("clipboard") == "https://example.org/a?b=c&d=$(e)")
         self.assertFalse(self.arrived.exists())
