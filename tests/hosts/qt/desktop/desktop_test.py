@@ -279,7 +279,7 @@ class Desktop(unittest.TestCase):
 def main():
     global PROGRAM
     PROGRAM = os.path.abspath(sys.argv.pop(1))
-    missing = [tool for tool in ("Xvfb", "xdotool", "xdg-open", "xdg-mime", "update-desktop-database") if not shutil.which(tool)]
+    missing = [tool for tool in ("Xvfb", "xdotool", "xdg-open", "xdg-mime", "update-desktop-database", "file") if not shutil.which(tool)]
     if missing:
         sys.exit("these are needed and not there: " + ", ".join(missing))
     unittest.main(verbosity=2)
