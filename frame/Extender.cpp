@@ -21,7 +21,7 @@ const Member* Find(MemberKey key) {
 
 }  // namespace
 
-Object& Extender::Behind(MemberKey key) {
+const Object& Extender::Behind(MemberKey key) const {
     if (!key.ByNumber() && More().Has(key)) return More();
     return site_.Control();
 }
@@ -42,7 +42,7 @@ Variant Extender::Call(MemberKey key, Arguments arguments) {
     return Find(key) ? Get(key, arguments) : Behind(key).Call(key, arguments);
 }
 
-bool Extender::Has(MemberKey key) const { return Find(key) || More().Has(key) || site_.Control().Has(key); }
+bool Extender::Has(MemberKey key) const { return Find(key) || Behind(key).Has(key); }
 
 ObjectRef Extender::Inner(std::string_view name) { return site_.Control().Inner(name); }
 

@@ -42,7 +42,9 @@ class Extender : public Object {
     Object& More() { return const_cast<Object&>(std::as_const(*this).More()); }
 
   private:
-    Object& Behind(MemberKey key);
+    /// Who answers to what is no member of the geometry. A number is always one of the control's.
+    const Object& Behind(MemberKey key) const;
+    Object& Behind(MemberKey key) { return const_cast<Object&>(std::as_const(*this).Behind(key)); }
 
     Site& site_;
 };

@@ -91,14 +91,16 @@ void ControlWidget::place(const frame::PropertyBag* saved) {
     enter(saved ? "ReadProperties" : "InitProperties", [&](Site& site) { site.Start(saved, width, height); });
     if (!alive) return;
     followFirstLook(saved ? Came::Loaded : Came::New);
+    if (!alive) return;
     started();
     if (shown_) enter("Show", [](Site& site) { site.Show(); });
 }
 
 /// What the widget and the control both know is brought together.
 void ControlWidget::followFirstLook(Came came) {
+    const QPointer<ControlWidget> alive = this;
     if (came == Came::New && testAttribute(Qt::WA_SetFont) && class_.table->Find("Font")) put("Font", font());
-    if (!class_.table->Find("Enabled")) return;
+    if (!alive || !class_.table->Find("Enabled")) return;
     if (testAttribute(Qt::WA_ForceDisabled))
         put("Enabled", false);
     else if (!designTime())

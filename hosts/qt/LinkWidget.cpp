@@ -91,7 +91,6 @@ int LinkWidget::heightForWidth(int width) const { return textSize(Twips(width)).
 void LinkWidget::started() { follow(); }
 
 void LinkWidget::propertyChanged(std::string_view key) {
-    const QPointer<LinkWidget> alive = this;
     if (key == "Caption") {
         QAccessibleEvent named(this, QAccessible::NameChanged);
         QAccessible::updateAccessibility(&named);

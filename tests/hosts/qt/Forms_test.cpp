@@ -182,6 +182,14 @@ TEST_F(FormsTest, ALinkWithoutAnIndexHasNone) {
     EXPECT_TRUE(link->extender().Has("LEFT"));
 }
 
+TEST_F(FormsTest, ANumberIsAlwaysAMemberOfTheControl) {
+    frame::Object& extender = Add("lnk")->extender();
+    EXPECT_TRUE(extender.Has(frame::dispatch::caption));
+    EXPECT_TRUE(extender.Has(1));
+    EXPECT_EQ(extender.Get(1), extender.Get("BackColor"));
+    EXPECT_FALSE(extender.Has(1000));
+}
+
 TEST_F(FormsTest, TheNameOfAControlIsReadOnlyForSiblings) {
     Link* link = Add("lnk");
     EXPECT_NE(ErrorOf([&] { link->extender().Put("Name", Variant("other")); }), 0);
