@@ -40,10 +40,18 @@ int Paled(std::uint32_t part) {
 
 /// The parts come from rounded quotients, so that a red above 128 counts as one more of green: kept so that washed pictures look
 /// the same everywhere.
-frame::OLE_COLOR WashedOut(frame::OLE_COLOR color) {
+frame::OLE_COLOR Washed(frame::OLE_COLOR color) {
     const std::uint32_t greenAndUp = RoundedByte(color.value);
     const std::uint32_t blueAndUp = RoundedByte(greenAndUp);
     return frame::Rgb(Paled(color.value), Paled(greenAndUp), Paled(blueAndUp));
+}
+
+/// An icon of the box's size as it is, with all its scales and soft edges; any other as the box shows it in its corner.
+frame::PictureRef Fitted(const frame::PictureRef& icon, child::PictureBox& box) {
+    if (box.BorderStyle() == 0 && icon->Width() == box.Width() && icon->Height() == box.Height()) return icon;
+    box.SetPicture(nullptr);
+    box.PaintPicture(icon, box.ScaleLeft(), box.ScaleTop());
+    return box.Image();
 }
 
 }  // namespace
@@ -66,9 +74,7 @@ bool FileIcon::GetFileIcon(const std::string& path, IconSize size, child::Pictur
     picture.Move(picture.Left(), picture.Top(), side, side);
     const frame::PictureRef icon = host_.Pictures().FileIcon(path, flags);
     if (!icon) return false;
-    picture.SetPicture(nullptr);
-    picture.PaintPicture(icon, picture.ScaleLeft(), picture.ScaleTop());
-    picture.SetPicture(picture.Image());
+    picture.SetPicture(Fitted(icon, picture));
     return true;
 }
 
@@ -83,9 +89,16 @@ void FileIcon::WashOutPicture(frame::DrawingSurface& picture, frame::OLE_COLOR m
             const std::int32_t point = picture.Point(x, y);
             if (point < 0) break;
             const frame::OLE_COLOR color = static_cast<std::uint32_t>(point);
-            if (color != maskColor) picture.PSet(x, y, WashedOut(color));
+            if (color != maskColor) picture.PSet(x, y, Washed(color));
         }
     picture.SetScaleMode(mode);
+}
+
+frame::PictureRef FileIcon::WashedOut(const frame::PictureRef& picture, frame::OLE_COLOR maskColor) {
+    constexpr std::uint32_t alphaBits = 0xFF000000u, rgbBits = 0xFFFFFFu;
+    return MapPixels(picture, [&](std::uint32_t pixel) {
+        return (pixel & rgbBits) == maskColor.value ? pixel : (pixel & alphaBits) | Washed(pixel & rgbBits).value;
+    });
 }
 
 bool FileIcon::GetByReference(std::string& path, bool& large, const frame::ObjectRef& picture, std::string& key, bool& open) const {

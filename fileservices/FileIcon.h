@@ -31,6 +31,8 @@ class FileIcon final : public frame::Object {
 
     /// Pales what a surface shows: the colour of each pixel halves its distance to white; pixels of the mask colour stay.
     static void WashOutPicture(frame::DrawingSurface& picture, frame::OLE_COLOR maskColor);
+    /// The same for a picture, at all its scales; what is clear stays so.
+    static frame::PictureRef WashedOut(const frame::PictureRef& picture, frame::OLE_COLOR maskColor);
 
     std::string Path() const override { return "FileIcon"; }
     const frame::ClassTable& Table() const override;

@@ -39,4 +39,11 @@ bool Picture::EqualsObject(const Object& other) const {
 
 const ClassTable& Picture::Table() const { return table; }
 
+PictureRef MapPixels(const PictureRef& picture, const std::function<std::uint32_t(std::uint32_t)>& map) {
+    if (picture->planes_.empty()) return picture;
+    std::vector<PixelPlane> planes = picture->planes_;
+    for (PixelPlane& plane : planes) std::transform(plane.pixels.begin(), plane.pixels.end(), plane.pixels.begin(), map);
+    return std::make_shared<Picture>(std::move(planes), picture->source_);
+}
+
 }  // namespace tessel::frame

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <string>
 #include <vector>
@@ -38,11 +39,17 @@ class Picture final : public Object {
     bool EqualsObject(const Object& other) const override;
 
   private:
+    friend std::shared_ptr<Picture> MapPixels(const std::shared_ptr<Picture>& picture,
+                                              const std::function<std::uint32_t(std::uint32_t)>& map);
+
     float width_ = 0, height_ = 0;
     std::string source_;
     std::vector<PixelPlane> planes_;
 };
 
 using PictureRef = std::shared_ptr<Picture>;
+
+/// The picture with every pixel changed, at every scale; one without pixels as it is.
+PictureRef MapPixels(const PictureRef& picture, const std::function<std::uint32_t(std::uint32_t)>& map);
 
 }  // namespace tessel::frame

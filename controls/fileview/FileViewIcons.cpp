@@ -68,7 +68,7 @@ void FileView::LoadIconPair(const std::string& path, std::string& key) {
         const bool isProgram = IsProgram(key);
         if (isProgram) key = fileservices::GetFileName(path, Disk().Separator());
         next([&] {
-            child::ListImage& image = images.ListImages.Add({}, key, TempPic.Image());
+            child::ListImage& image = images.ListImages.Add({}, key, TempPic.Picture());
             if (isProgram) image.SetTag(programExtension);
         });
     };

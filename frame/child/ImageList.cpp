@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <limits>
 #include <utility>
 
 #include "frame/ClassTable.h"
@@ -189,17 +188,7 @@ void ImageListHolder::Set(ImageList* list) {
 
 frame::PictureRef WithMask(const frame::PictureRef& picture, frame::OLE_COLOR mask) {
     constexpr std::uint32_t rgbBits = 0xFFFFFFu;
-    constexpr double noLimit = std::numeric_limits<double>::infinity();
-    std::vector<frame::PixelPlane> planes;
-    const auto isNew = [&](const frame::PixelPlane& plane) { return planes.empty() || plane.scale > planes.back().scale; };
-    for (const frame::PixelPlane* plane = picture->Plane(0); plane && isNew(*plane);
-         plane = picture->Plane(std::nextafter(planes.back().scale, noLimit)))
-        planes.push_back(*plane);
-    if (planes.empty()) return picture;
-    for (frame::PixelPlane& plane : planes)
-        for (std::uint32_t& pixel : plane.pixels)
-            if ((pixel & rgbBits) == (mask.value & rgbBits)) pixel = 0;
-    return std::make_shared<frame::Picture>(std::move(planes), picture->Source());
+    return MapPixels(picture, [&](std::uint32_t pixel) { return (pixel & rgbBits) == (mask.value & rgbBits) ? 0 : pixel; });
 }
 
 namespace {

@@ -24,6 +24,7 @@ class RedIcons final : public frame::PictureLoader {
     frame::PictureRef FileIcon(const std::string& path, int flags) override {
         asked.push_back(path + " " + std::to_string(flags));
         if (!hasIcons) return nullptr;
+        if (icon) return icon;
         const int side = (flags & 1) != 0 ? 16 : 32;
         frame::PixelPlane plane{1, side, side, {}};
         for (int i = 0; i < side * side; ++i) plane.pixels.push_back(i % side == 0 ? 0 : 0xFF000000u | red.value);
@@ -32,6 +33,7 @@ class RedIcons final : public frame::PictureLoader {
 
     std::vector<std::string> asked;
     bool hasIcons = true;
+    frame::PictureRef icon;  // instead of the red squares
 };
 
 class Board final : public frame::Control {
@@ -134,13 +136,47 @@ TEST_F(FileIconTest, TheIconStaysOnTheBoxWhichTakesItsSize) {
     EXPECT_EQ(box.Width(), 240);
     EXPECT_EQ(box.Height(), 240);
     ASSERT_TRUE(box.Picture());
-    const frame::PixelPlane* plane = box.Picture()->Plane(1);
+    const frame::PictureRef image = box.Image();
+    const frame::PixelPlane* plane = image->Plane(1);
     ASSERT_TRUE(plane);
     EXPECT_EQ(plane->width, 16);
     EXPECT_EQ(plane->pixels[0], 0xFFFFFFFFu);
     EXPECT_EQ(plane->pixels[1], 0xFF0000FFu);
     EXPECT_EQ(plane->pixels.back(), 0xFF0000FFu);
-    EXPECT_EQ(frame::ObjectRef(box.Image()), frame::ObjectRef(box.Picture()));
+    box.SetPicture(box.Picture());
+    EXPECT_TRUE(box.Image()->EqualsObject(*image));
+}
+
+TEST_F(FileIconTest, AnIconKeepsItsScalesAndItsSoftEdges) {
+    constexpr std::uint32_t faint = 0x400000FFu;
+    pictures.icon =
+        std::make_shared<frame::Picture>(std::vector<frame::PixelPlane>{{1, 16, 16, std::vector<std::uint32_t>(256, faint)},
+                                                                        {2, 32, 32, std::vector<std::uint32_t>(1024, faint)}},
+                                         "");
+    EXPECT_TRUE(Get(At("a.txt")));
+    ASSERT_TRUE(box.Picture());
+    EXPECT_EQ(box.Picture()->Plane(1)->pixels[0], faint);
+    EXPECT_EQ(box.Picture()->Plane(2)->width, 32);
+    EXPECT_EQ(box.Point(0, 0), static_cast<int>(white.value)) << "less than half opaque";
+}
+
+TEST_F(FileIconTest, AnIconOfAnotherSizeStandsInTheCorner) {
+    pictures.icon = std::make_shared<frame::Picture>(
+        std::vector<frame::PixelPlane>{{1, 8, 8, std::vector<std::uint32_t>(64, 0xFF0000FFu)}}, "");
+    EXPECT_TRUE(Get(At("a.txt")));
+    EXPECT_EQ(box.Picture()->Plane(1)->width, 16);
+    EXPECT_EQ(box.Point(7 * 15, 7 * 15), 0x0000FF);
+    EXPECT_EQ(box.Point(8 * 15, 8 * 15), static_cast<int>(white.value));
+}
+
+TEST_F(FileIconTest, WashingOutAPicturePalesAllItsScales) {
+    const auto picture =
+        std::make_shared<frame::Picture>(std::vector<frame::PixelPlane>{{1, 2, 1, {0xFF000000u, 0xFF404040u}},
+                                                                        {2, 2, 2, {0x80000000u, 0, 0xFF0300FFu, 0xFFC0C0C0u}}},
+                                         "");
+    const frame::PictureRef pale = FileIcon::WashedOut(picture, 0xC0C0C0);
+    EXPECT_EQ(pale->Plane(1)->pixels, (std::vector<std::uint32_t>{0xFF808080u, 0xFFA0A0A0u}));
+    EXPECT_EQ(pale->Plane(2)->pixels, (std::vector<std::uint32_t>{0x80808080u, 0x00808080u, 0xFF8180FFu, 0xFFC0C0C0u}));
 }
 
 TEST_F(FileIconTest, NothingOfTheIconBeforeShinesThrough) {
