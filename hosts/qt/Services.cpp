@@ -13,6 +13,7 @@
 #include <QThread>
 #include <array>
 #include <cmath>
+#include <utility>
 
 #include "frame/ChildControl.h"
 #include "frame/Dates.h"
@@ -41,9 +42,34 @@ EventLoop::EventLoop(std::function<void()> settle) {
     soon_.setSingleShot(true);
     soon_.setInterval(0);
     soon_.callOnTimeout(std::move(settle));
+    nextFrame_.setSingleShot(true);
+    nextFrame_.callOnTimeout([this] { PaintHeld(); });
+    qApp->installEventFilter(this);
 }
 
-void EventLoop::Turn() { QCoreApplication::processEvents(); }
+void EventLoop::Turn() {
+    ++turns_;
+    QCoreApplication::processEvents();
+    --turns_;
+    if (std::exchange(painted_, false)) sincePaint_.start();
+}
+
+/// A window that asks to be painted before the frame is over waits for the next.
+bool EventLoop::eventFilter(QObject* watched, QEvent* event) {
+    if (turns_ == 0 || event->type() != QEvent::UpdateRequest || !watched->isWidgetType()) return false;
+    if (!sincePaint_.isValid() || sincePaint_.hasExpired(frame)) {
+        painted_ = true;
+        return false;
+    }
+    held_.emplace_back(watched);
+    if (!nextFrame_.isActive()) nextFrame_.start(frame);
+    return true;
+}
+
+void EventLoop::PaintHeld() {
+    for (const QPointer<QObject>& window : std::exchange(held_, {}))
+        if (window) QCoreApplication::postEvent(window, new QEvent(QEvent::UpdateRequest), Qt::LowEventPriority);
+}
 
 void EventLoop::WantTurn() {
     if (!soon_.isActive()) soon_.start();

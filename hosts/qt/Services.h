@@ -1,11 +1,14 @@
 #pragma once
 
+#include <QElapsedTimer>
+#include <QPointer>
 #include <QTimer>
 #include <functional>
 #include <memory>
 #include <random>
 #include <unordered_map>
 #include <utility>
+#include <vector>
 
 #include "frame/host.h"
 #include "hosts/posix/Opener.h"
@@ -13,14 +16,25 @@
 /// The services of the Qt host.
 namespace tessel::qt {
 
-class EventLoop final : public frame::MessageLoop {
+/// A turn delivers whatever is due. In a long run of turns windows are painted at most once a frame, and what is then still to be
+/// painted is painted a frame later.
+class EventLoop final : private QObject, public frame::MessageLoop {
   public:
+    static constexpr int frame = 16;  // milliseconds
+
     explicit EventLoop(std::function<void()> settle);
     void Turn() override;
     void WantTurn() override;
 
   private:
-    QTimer soon_;
+    bool eventFilter(QObject* watched, QEvent* event) override;
+    void PaintHeld();
+
+    QTimer soon_, nextFrame_;
+    int turns_ = 0;  // that are running
+    bool painted_ = false;
+    QElapsedTimer sincePaint_;
+    std::vector<QPointer<QObject>> held_;  // windows that are to be painted
 };
 
 /// Boxes and dialogs stand over the active window.

@@ -1,7 +1,9 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <QApplication>
 #include <QDateTime>
+#include <QElapsedTimer>
 #include <QFile>
 #include <QGuiApplication>
 #include <QImage>
@@ -9,6 +11,8 @@
 #include <QPalette>
 #include <QTemporaryDir>
 #include <QTest>
+#include <QTimer>
+#include <QWidget>
 #include <functional>
 
 #include "frame/Dates.h"
@@ -103,6 +107,51 @@ TEST(EventLoopTest, ATurnDeliversWhatIsDueAndManyWishesAreOneTurn) {
     EXPECT_EQ(settled, 1);
     loop.Turn();
     EXPECT_EQ(settled, 1);
+}
+
+TEST(EventLoopTest, InARunOfTurnsAWindowIsPaintedOnceAFrameAndInTheEndAsItStands) {
+    struct Window final : QWidget {
+        void paintEvent(QPaintEvent*) override {
+            ++paints;
+            shown = state;
+        }
+        int paints = 0, state = 0, shown = -1;
+    };
+    EventLoop loop([] {});
+    Window window;
+    window.show();
+    ASSERT_TRUE(QTest::qWaitForWindowExposed(&window));
+    const int before = window.paints;
+    QElapsedTimer time;
+    time.start();
+    constexpr int turns = 2000;
+    for (int turn = 1; turn <= turns; ++turn) {
+        window.state = turn;
+        window.update();
+        loop.Turn();
+    }
+    const auto frames = static_cast<int>(time.elapsed() / EventLoop::frame) + 1;
+    EXPECT_GE(window.paints, before + 1);
+    EXPECT_LE(window.paints - before, frames + 1);
+    EXPECT_TRUE(QTest::qWaitFor([&] { return window.shown == turns; }));
+}
+
+TEST(EventLoopTest, OutsideOfTurnsWindowsArePaintedAsEver) {
+    EventLoop loop([] {});
+    struct Window final : QWidget {
+        void paintEvent(QPaintEvent*) override { ++paints; }
+        int paints = 0;
+    };
+    Window window;
+    window.show();
+    ASSERT_TRUE(QTest::qWaitForWindowExposed(&window));
+    for (int i = 0; i < 5; ++i) {
+        const int before = window.paints;
+        window.update();
+        QApplication::sendPostedEvents(&window, QEvent::UpdateRequest);
+        QApplication::processEvents();
+        EXPECT_EQ(window.paints, before + 1);
+    }
 }
 
 // Chance
