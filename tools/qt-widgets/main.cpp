@@ -15,9 +15,16 @@ namespace {
 using namespace tessel::frame;
 
 /// "LinkTo" as Qt names properties: "linkTo".
+bool IsCapital(char letter) { return letter >= 'A' && letter <= 'Z'; }
+
+/// The first word begins small; one that is an abbreviation is small as a whole: `backColor`, `oleDragMode`.
 std::string Lower(std::string_view name) {
     std::string result(name);
-    if (!result.empty() && result[0] >= 'A' && result[0] <= 'Z') result[0] = static_cast<char>(result[0] - 'A' + 'a');
+    for (std::size_t i = 0; i < name.size() && IsCapital(name[i]); ++i) {
+        const bool startsNextWord = i > 0 && i + 1 < name.size() && !IsCapital(name[i + 1]);
+        if (startsNextWord) break;
+        result[i] = static_cast<char>(name[i] - 'A' + 'a');
+    }
     return result;
 }
 
