@@ -154,7 +154,7 @@ void LinksPage::log(const QString& line) {
     if (log_) log_->appendPlainText(line);
 }
 
-void LinksPage::pose() {
+void LinksPage::pose(const QString& /*name*/) {
     const auto find = [this](const char* name) { return findChild<qt::Link*>(name); };
     const auto visit = [](controls::Link& link, float x) { link.Label1.MouseMoveInput(0, 0, x, link.Label1.Height() / 2); };
     // One that was used, one under the pointer, one with the focus.

@@ -15,7 +15,8 @@ class LinksPage final : public Page {
     explicit LinksPage(QWidget* parent = nullptr);
 
     QString title() const override { return "Links"; }
-    void pose() override;
+    QString hint() const override { return tr("Move, press, or go from link to link with the Tab key."); }
+    void pose(const QString& name) override;
 
   private:
     QWidget* makeTargets();

@@ -1,6 +1,9 @@
 #include "apps/gallery/Palettes.h"
 
+#include <QApplication>
 #include <QColor>
+#include <QIcon>
+#include <QStandardPaths>
 
 namespace tessel::gallery {
 
@@ -25,6 +28,17 @@ QPalette PaletteOf(Scheme scheme) {
     for (const auto role : {QPalette::WindowText, QPalette::Text, QPalette::ButtonText})
         palette.setColor(QPalette::Disabled, role, faint);
     return palette;
+}
+
+void Follow(const QPalette& palette) {
+    static const bool desktopHasIcons = !QIcon::themeName().isEmpty() && QIcon::themeName() != "hicolor";
+    if (!desktopHasIcons) {
+        QIcon::setThemeSearchPaths(
+            QStandardPaths::locateAll(QStandardPaths::GenericDataLocation, "icons", QStandardPaths::LocateDirectory));
+        constexpr int middle = 128;
+        QIcon::setThemeName(palette.color(QPalette::Window).lightness() < middle ? "breeze-dark" : "breeze");
+    }
+    QApplication::setPalette(palette);
 }
 
 }  // namespace tessel::gallery

@@ -17,22 +17,24 @@ int TakeShots(const QString& folder) {
         return 1;
     }
     for (const auto& [scheme, name] : {std::pair(Scheme::Light, "light"), std::pair(Scheme::Dark, "dark")}) {
-        Follow(scheme);
+        Follow(PaletteOf(scheme));
         Window window;
         window.show();
         for (qsizetype i = 0; i < window.pages().size(); ++i) {
             Page* page = window.pages()[i];
             window.choose(static_cast<int>(i));
-            QApplication::processEvents();
-            page->pose();
-            QApplication::processEvents();
-            const QString file =
-                QString("%1/%2-%3-%4x.png").arg(folder, page->title().toLower(), name).arg(window.devicePixelRatioF());
-            if (!window.grab().save(file)) {
-                complaint << "gallery: cannot write " << file << '\n';
-                return 1;
+            for (const QString& pose : page->poses()) {
+                QApplication::processEvents();
+                page->pose(pose);
+                QApplication::processEvents();
+                const QString what = page->title().toLower() + (pose.isEmpty() ? QString() : '-' + pose);
+                const QString file = QString("%1/%2-%3-%4x.png").arg(folder, what, name).arg(window.devicePixelRatioF());
+                if (!window.grab().save(file)) {
+                    complaint << "gallery: cannot write " << file << '\n';
+                    return 1;
+                }
+                out << file << '\n';
             }
-            out << file << '\n';
         }
     }
     return 0;

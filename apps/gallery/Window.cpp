@@ -8,12 +8,11 @@
 #include <QStackedWidget>
 #include <QStatusBar>
 
+#include "apps/gallery/FilesPage.h"
 #include "apps/gallery/LinksPage.h"
 #include "hosts/qt/Host.h"
 
 namespace tessel::gallery {
-
-void Follow(Scheme scheme) { QApplication::setPalette(PaletteOf(scheme)); }
 
 Window::Window(QWidget* parent) : QMainWindow(parent), list_(new QListWidget), stack_(new QStackedWidget) {
     setWindowTitle(tr("Tesselcontrols4 Gallery"));
@@ -24,7 +23,10 @@ Window::Window(QWidget* parent) : QMainWindow(parent), list_(new QListWidget), s
     row->addWidget(list_);
     row->addWidget(stack_, 1);
     setCentralWidget(middle);
-    connect(list_, &QListWidget::currentRowChanged, stack_, &QStackedWidget::setCurrentIndex);
+    connect(list_, &QListWidget::currentRowChanged, this, [this](int page) {
+        stack_->setCurrentIndex(page);
+        statusBar()->showMessage(pages_[page]->hint());
+    });
 
     connect(qt::Host::of(this).get(), &qt::Host::unhandledError, this,
             [this](int number, const QString& description, const QString& where) {
@@ -32,7 +34,7 @@ Window::Window(QWidget* parent) : QMainWindow(parent), list_(new QListWidget), s
             });
     makeMenus();
     addPage(new LinksPage);
-    statusBar()->showMessage(tr("Move, press, or go from link to link with the Tab key."));
+    addPage(new FilesPage);
     choose(0);
 }
 
@@ -53,7 +55,7 @@ void Window::makeMenus() {
     auto* schemes = new QActionGroup(this);
     const QPalette desktop = QApplication::palette();
     const auto add = [&](const QString& text, const QPalette& palette) {
-        QAction* action = view->addAction(text, this, [palette] { QApplication::setPalette(palette); });
+        QAction* action = view->addAction(text, this, [palette] { Follow(palette); });
         action->setCheckable(true);
         schemes->addAction(action);
         return action;

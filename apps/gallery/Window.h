@@ -31,7 +31,4 @@ class Window final : public QMainWindow {
     QList<Page*> pages_;
 };
 
-/// Makes the whole application follow a palette.
-void Follow(Scheme scheme);
-
 }  // namespace tessel::gallery

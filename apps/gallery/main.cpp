@@ -2,6 +2,7 @@
 #include <QCommandLineParser>
 #include <QStandardPaths>
 
+#include "apps/gallery/Palettes.h"
 #include "apps/gallery/Shots.h"
 #include "apps/gallery/Window.h"
 
@@ -23,6 +24,7 @@ int main(int count, char** arguments) {
         QApplication::setStyle("Fusion");
         return tessel::gallery::TakeShots(parser.value(shots));
     }
+    tessel::gallery::Follow(QApplication::palette());
     tessel::gallery::Window window;
     window.show();
     return QApplication::exec();
