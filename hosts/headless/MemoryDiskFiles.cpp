@@ -204,6 +204,8 @@ Status MemoryDisk::SetAttributes(std::string_view path, std::int32_t value) {
 }
 
 std::string MemoryDisk::TemporaryFolder() {
+    for (const auto& [letter, drive] : drives_)
+        if (std::string folder = Joined(drive->root, "Temp"); FolderExists(folder)) return folder;
     return drives_.empty() ? std::string() : Joined(drives_.begin()->second->root, "Temp");
 }
 

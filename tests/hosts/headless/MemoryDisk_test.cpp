@@ -268,6 +268,14 @@ TEST_F(MemoryDiskTest, ThingsAreRemovedAndDrivesToo) {
     EXPECT_EQ(disk_.TemporaryFolder(), "");
 }
 
+TEST(MemoryDisk, AnEarlierDriveDoesNotTakeTheTemporaryFolderOver) {
+    MemoryDisk disk;
+    disk.SetDrive("A", {.type = frame::driveTypes::removable}).Check();
+    EXPECT_EQ(disk.TemporaryFolder(), "C:\\Temp");
+    disk.Remove("C:\\Temp").Check();
+    EXPECT_EQ(disk.TemporaryFolder(), "A:\\Temp") << "where it would be made";
+}
+
 TEST_F(MemoryDiskTest, PicturesHaveASize) {
     disk_.SetFile("C:\\p.bmp", {.picture = std::pair(1500.0f, 900.0f)}).Check();
     EXPECT_EQ(disk_.PictureSize("C:\\p.bmp"), std::pair(1500.0f, 900.0f));
