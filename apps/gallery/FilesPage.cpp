@@ -42,8 +42,9 @@ constexpr ViewChoice viewChoices[] = {
 };
 
 /// A button with a theme's icon, or a word where the theme has none.
-QToolButton* Button(const char* icon, const QString& text, const QString& tip) {
+QToolButton* Button(const char* name, const char* icon, const QString& text, const QString& tip) {
     auto* button = new QToolButton;
+    button->setObjectName(name);
     button->setIcon(QIcon::fromTheme(icon));
     button->setText(text);
     button->setToolTip(tip);
@@ -71,10 +72,11 @@ FilesPage::~FilesPage() = default;
 
 QLayout* FilesPage::makePathRow() {
     auto* row = new QHBoxLayout;
-    up_ = Button("go-up", tr("Up"), tr("To the folder above (Alt+Up)"));
+    up_ = Button("up", "go-up", tr("Up"), tr("To the folder above (Alt+Up)"));
     path_ = new QLineEdit;
+    path_->setObjectName("path");
     path_->setAccessibleName(tr("Folder"));
-    auto* home = Button("go-home", tr("Home"), tr("To your home folder (Alt+Home)"));
+    auto* home = Button("home", "go-home", tr("Home"), tr("To your home folder (Alt+Home)"));
     row->addWidget(up_);
     row->addWidget(home);
     row->addWidget(path_, 1);
@@ -88,6 +90,7 @@ QLayout* FilesPage::makePathRow() {
 QLayout* FilesPage::makeFilterRow() {
     auto* row = new QHBoxLayout;
     filter_ = new QComboBox;
+    filter_->setObjectName("filter");
     filter_->setEditable(true);
     filter_->addItems({"*", "*.txt", "*.pdf", "*.jpg", "*.[ch]*"});
     filter_->setAccessibleName(tr("Filter"));
@@ -95,6 +98,7 @@ QLayout* FilesPage::makeFilterRow() {
     auto* caption = new QLabel(tr("&Filter:"));
     caption->setBuddy(filter_);
     hidden_ = new QCheckBox(tr("&Hidden"));
+    hidden_->setObjectName("hidden");
     hidden_->setToolTip(tr("Show hidden files and folders too"));
     row->addWidget(caption);
     row->addWidget(filter_);
@@ -103,7 +107,7 @@ QLayout* FilesPage::makeFilterRow() {
 
     views_ = new QButtonGroup(this);
     for (const ViewChoice& choice : viewChoices) {
-        QToolButton* button = Button(choice.icon, tr(choice.text), tr("%1 (%2)").arg(tr(choice.tip), choice.keys));
+        QToolButton* button = Button(choice.icon, choice.icon, tr(choice.text), tr("%1 (%2)").arg(tr(choice.tip), choice.keys));
         button->setShortcut(QKeySequence(choice.keys));
         button->setCheckable(true);
         button->setChecked(choice.view == files_->view());
@@ -113,12 +117,13 @@ QLayout* FilesPage::makeFilterRow() {
     row->addStretch(1);
 
     search_ = new QLineEdit;
+    search_->setObjectName("search");
     search_->setPlaceholderText(tr("Search here and below"));
     search_->setClearButtonEnabled(true);
     constexpr int lettersWide = 28;
     search_->setMinimumWidth(lettersWide * fontMetrics().averageCharWidth());
     search_->setAccessibleName(tr("Search"));
-    find_ = Button("edit-find", tr("Search"), tr("Search"));
+    find_ = Button("find", "edit-find", tr("Search"), tr("Search"));
     row->addWidget(search_);
     row->addWidget(find_);
 
@@ -143,7 +148,9 @@ QLayout* FilesPage::makeFilterRow() {
 QLayout* FilesPage::makeStatusRow() {
     auto* row = new QHBoxLayout;
     count_ = new QLabel;
+    count_->setObjectName("count");
     size_ = new QLabel;
+    size_->setObjectName("size");
     row->addWidget(count_);
     row->addStretch(1);
     row->addWidget(size_);
