@@ -12,7 +12,6 @@
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QLineEdit>
-#include <QLocale>
 #include <QPointer>
 #include <QTemporaryDir>
 #include <QTimer>
@@ -20,6 +19,7 @@
 #include <QUrl>
 #include <QVBoxLayout>
 
+#include "apps/gallery/FileStatus.h"
 #include "hosts/qt/Convert.h"
 
 namespace tessel::gallery {
@@ -61,7 +61,7 @@ FilesPage::FilesPage(QWidget* parent) : Page(parent) {
     column->addLayout(makePathRow());
     column->addLayout(makeFilterRow());
     column->addWidget(files_, 1);
-    column->addLayout(makeStatusRow());
+    column->addWidget(status_);
     makeKeys();
     files_->setPathRoot("/");
     files_->setPath(QDir::homePath());  // listed when it is shown
@@ -145,18 +145,6 @@ QLayout* FilesPage::makeFilterRow() {
     return row;
 }
 
-QLayout* FilesPage::makeStatusRow() {
-    auto* row = new QHBoxLayout;
-    count_ = new QLabel;
-    count_->setObjectName("count");
-    size_ = new QLabel;
-    size_->setObjectName("size");
-    row->addWidget(count_);
-    row->addStretch(1);
-    row->addWidget(size_);
-    return row;
-}
-
 void FilesPage::makeList() {
     files_ = new qt::FileView;
     files_->setObjectName("files");
@@ -168,17 +156,9 @@ void FilesPage::makeList() {
     constexpr int refreshEach = 2000;
     files_->setRefreshInterval(refreshEach);
     connect(files_, &qt::FileView::beforeAddItem, this, [this](bool& cancel, std::string&) { cancel = cancel || stopped_; });
-    connect(files_, &qt::FileView::afterAddItem, this, [this] {
-        constexpr int often = 256;
-        if (files_->itemCount() % often == 0) followCount();
-    });
-    connect(files_, &qt::FileView::afterPaint, this, [this] {
-        followPath();
-        followCount();
-        followSize();
-    });
-    connect(files_, &qt::FileView::totalSizeReady, this, &FilesPage::followSize);
+    connect(files_, &qt::FileView::afterPaint, this, &FilesPage::followPath);
     connect(files_, &qt::FileView::dblClick, this, &FilesPage::enter);
+    status_ = new FileStatus(files_);
 }
 
 void FilesPage::makeKeys() {
@@ -255,7 +235,7 @@ void FilesPage::fill(Shows what, const std::function<void()>& run) {
     find_->setIcon(QIcon::fromTheme("process-stop"));
     find_->setText(tr("Stop"));
     find_->setToolTip(tr("Stop (Esc)"));
-    size_->clear();
+    status_->setSearched(what == Shows::Results ? folder_ : QString());
     run();
     if (!alive) return;
     filling_ = false;
@@ -287,24 +267,6 @@ void FilesPage::followPath() {
     if (!files_->path().isEmpty()) folder_ = files_->path();
     path_->setText(folder_);
     up_->setEnabled(!filling_ && (shows_ == Shows::Results || folder_ != files_->pathRoot()));
-}
-
-void FilesPage::followCount() {
-    const int count = files_->itemCount();
-    const QString number = QLocale().toString(count);
-    if (shows_ == Shows::Results)
-        count_->setText(count == 1 ? tr("1 file found below %1").arg(folder_) : tr("%1 files found below %2").arg(number, folder_));
-    else
-        count_->setText(count == 1 ? tr("1 item") : tr("%1 items").arg(number));
-}
-
-void FilesPage::followSize() {
-    if (!files_->totalSizeKnown()) {
-        size_->setText(tr("measuring…"));
-        return;
-    }
-    const auto bytes = static_cast<qint64>(files_->totalSize().toDouble());
-    size_->setText(tr("%1 in all").arg(QLocale().formattedDataSize(bytes, 1, QLocale::DataSizeTraditionalFormat)));
 }
 
 // For pictures.
@@ -362,8 +324,7 @@ void FilesPage::pose(const QString& name) {
     }
     files_->setItemIndex(1);
     files_->setItemSelected(true);
-    Q_UNUSED(files_->totalSize());  // waits until it is known
-    followSize();
+    status_->waitForSize();
 }
 
 }  // namespace tessel::gallery

@@ -9,13 +9,14 @@
 class QButtonGroup;
 class QCheckBox;
 class QComboBox;
-class QLabel;
 class QLayout;
 class QLineEdit;
 class QTemporaryDir;
 class QToolButton;
 
 namespace tessel::gallery {
+
+class FileStatus;
 
 /// The files of this machine: a list with a path line, a filter, four views, a search, and what it all comes to.
 class FilesPage final : public Page {
@@ -37,7 +38,6 @@ class FilesPage final : public Page {
 
     QLayout* makePathRow();
     QLayout* makeFilterRow();
-    QLayout* makeStatusRow();
     void makeList();
     void makeKeys();
 
@@ -50,8 +50,6 @@ class FilesPage final : public Page {
     void fill(Shows what, const std::function<void()>& run);
     void chooseView(int view);
     void followPath();
-    void followCount();
-    void followSize();
     QString fullPathOfItem() const;
     void makeSample();
 
@@ -63,7 +61,7 @@ class FilesPage final : public Page {
     QLineEdit* search_ = nullptr;
     QToolButton* find_ = nullptr;
     qt::FileView* files_ = nullptr;
-    QLabel *count_ = nullptr, *size_ = nullptr;
+    FileStatus* status_ = nullptr;
     QList<QWidget*> idleOnly_;  // what begins a listing
     std::unique_ptr<QTemporaryDir> sample_;
 
