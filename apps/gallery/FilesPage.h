@@ -51,7 +51,6 @@ class FilesPage final : public Page {
     void chooseView(int view);
     void followPath();
     QString fullPathOfItem() const;
-    void makeSample();
 
     QToolButton* up_ = nullptr;
     QLineEdit* path_ = nullptr;
