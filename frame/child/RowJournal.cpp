@@ -7,23 +7,25 @@ namespace tessel::child {
 
 using Kind = RowChange::Kind;
 
-void RowJournal::Inserted(std::uint32_t position) {
+void RowJournal::Inserted(std::uint32_t first, std::uint32_t count) {
     if (IsReset()) return;
-    if (RowChange* last = Last(Kind::Inserted); last && position >= last->first && position - last->first <= last->count)
-        ++last->count;
+    if (RowChange* last = Last(Kind::Inserted); last && first >= last->first && first - last->first <= last->count)
+        last->count += count;
     else
-        Add({Kind::Inserted, position, 1});
+        Add({Kind::Inserted, first, count});
 }
 
-void RowJournal::Removed(std::uint32_t position) {
+void RowJournal::Removed(std::uint32_t first, std::uint32_t count) {
     if (IsReset()) return;
-    if (RowChange* last = Last(Kind::Inserted); last && position >= last->first && position - last->first < last->count) {
-        if (--last->count == 0) changes_.pop_back();
-    } else if (last = Last(Kind::Removed); last && (position == last->first || position + 1 == last->first)) {
-        last->first = position;
-        ++last->count;
+    const std::uint32_t end = first + count;
+    if (RowChange* last = Last(Kind::Inserted); last && first >= last->first && end <= last->first + last->count) {
+        last->count -= count;
+        if (last->count == 0) changes_.pop_back();
+    } else if (last = Last(Kind::Removed); last && first <= last->first && end >= last->first) {
+        last->first = first;
+        last->count += count;
     } else {
-        Add({Kind::Removed, position, 1});
+        Add({Kind::Removed, first, count});
     }
 }
 

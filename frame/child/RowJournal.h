@@ -25,8 +25,8 @@ struct RowChange {
 /// do not fold into few entries become one `Reset`, or one wide range where rows were only changed.
 class RowJournal {
   public:
-    void Inserted(std::uint32_t position);
-    void Removed(std::uint32_t position);
+    void Inserted(std::uint32_t first, std::uint32_t count = 1);
+    void Removed(std::uint32_t first, std::uint32_t count = 1);
     void Changed(std::uint32_t first, std::uint32_t count = 1);
     /// All `count` rows of the list have been put in another order.
     void Reordered(std::uint32_t count);

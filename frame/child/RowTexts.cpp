@@ -58,41 +58,4 @@ const std::string* RowTexts::Own(RowId row, int column) const {
     return nullptr;
 }
 
-void TextIndex::Add(RowId row, std::string_view text) {
-    constexpr std::size_t rowsPerBucket = 2;
-    if (count_ >= heads_.size() * rowsPerBucket) Widen();
-    entries_.MakeRoom(row);
-    entries_[row].hash = Hash(text);
-    Link(row);
-    ++count_;
-}
-
-void TextIndex::Remove(RowId row) {
-    RowId* link = &heads_[Bucket(entries_[row].hash)];
-    while (*link != row) link = &entries_[*link].next;
-    *link = entries_[row].next;
-    --count_;
-}
-
-std::uint32_t TextIndex::Hash(std::string_view text) {
-    const std::uint64_t hash = frame::HashNoCase()(text);
-    return static_cast<std::uint32_t>(hash ^ hash >> 32);
-}
-
-void TextIndex::Link(RowId row) {
-    RowId& head = heads_[Bucket(entries_[row].hash)];
-    entries_[row].next = std::exchange(head, row);
-}
-
-void TextIndex::Widen() {
-    constexpr std::size_t fewest = 32;
-    const std::vector<RowId> before = std::exchange(heads_, std::vector<RowId>(std::max(fewest, heads_.size() * 2), none));
-    for (RowId head : before)
-        while (head != none) {
-            const RowId next = entries_[head].next;
-            Link(head);
-            head = next;
-        }
-}
-
 }  // namespace tessel::child

@@ -7,6 +7,7 @@
 #include <unordered_map>
 #include <vector>
 
+#include "frame/child/RowIndex.h"
 #include "frame/child/RowPages.h"
 
 namespace tessel::child {
@@ -68,33 +69,17 @@ class RowTexts {
 class TextIndex {
   public:
     /// `row` is not in the index.
-    void Add(RowId row, std::string_view text);
+    void Add(RowId row, std::string_view text) { index_.Add(row, HashIndex::HashOf(text)); }
     /// `row` is in the index.
-    void Remove(RowId row);
+    void Remove(RowId row) { index_.Remove(row); }
     /// Calls `each` with every row that may have the text, in no particular order.
     template <class F>
     void Candidates(std::string_view text, F&& each) const {
-        if (heads_.empty()) return;
-        const std::uint32_t hash = Hash(text);
-        for (RowId row = heads_[Bucket(hash)]; row != none; row = entries_[row].next)
-            if (entries_[row].hash == hash) each(row);
+        index_.Candidates(HashIndex::HashOf(text), each);
     }
 
   private:
-    static constexpr RowId none = 0xFFFFFFFFu;
-    struct Entry {
-        std::uint32_t hash = 0;
-        RowId next = none;  // in the same bucket
-    };
-
-    static std::uint32_t Hash(std::string_view text);
-    std::size_t Bucket(std::uint32_t hash) const { return hash & (heads_.size() - 1); }
-    void Link(RowId row);
-    void Widen();
-
-    RowPages<Entry> entries_;
-    std::vector<RowId> heads_;  // the first row of each bucket; their number is a power of two
-    std::size_t count_ = 0;
+    HashIndex index_;
 };
 
 }  // namespace tessel::child

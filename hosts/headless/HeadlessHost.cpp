@@ -6,6 +6,7 @@
 #include "frame/Extender.h"
 #include "frame/Text.h"
 #include "frame/child/ListView.h"
+#include "frame/child/TreeView.h"
 
 namespace tessel::headless {
 
@@ -158,6 +159,19 @@ class HeadlessHost::EditLogger final : public child::ListViewPeer {
     child::ListView& list_;
 };
 
+/// The same of a tree.
+class HeadlessHost::TreeEditLogger final : public child::TreeViewPeer {
+  public:
+    TreeEditLogger(Log& log, child::TreeView& tree) : log_(log), tree_(tree) {}
+    void Update() override {}
+    child::TreeScreen* Screen() override { return nullptr; }
+    void EditBegan(child::NodeId) override { log_.Add({"edit", tree_.Path()}); }
+
+  private:
+    Log& log_;
+    child::TreeView& tree_;
+};
+
 /// Children are shown where a program asks for it; every surface is logged.
 class HeadlessHost::Peers final : public frame::PeerFactory {
   public:
@@ -165,6 +179,7 @@ class HeadlessHost::Peers final : public frame::PeerFactory {
     std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl& child) override {
         if (host_.makePeer) return host_.makePeer(child);
         if (auto* list = dynamic_cast<child::ListView*>(&child)) return std::make_unique<EditLogger>(host_.log, *list);
+        if (auto* tree = dynamic_cast<child::TreeView*>(&child)) return std::make_unique<TreeEditLogger>(host_.log, *tree);
         return nullptr;
     }
     std::unique_ptr<frame::Canvas> MakeCanvas(frame::DrawingSurface&, frame::Object& owner) override {

@@ -159,6 +159,7 @@ class HeadlessHost {
   private:
     friend class HeadlessSite;
     class EditLogger;
+    class TreeEditLogger;
     class LoggingCanvas;
     class Peers;
 

@@ -89,6 +89,20 @@ TEST(RowJournalTest, RowsRemovedAtOnePositionAreOneEntry) {
     EXPECT_THAT(journal.Take(), ElementsAre(Removed(40, 60)));
 }
 
+TEST(RowJournalTest, RangesFoldAsTheirRowsDo) {
+    RowJournal journal;
+    journal.Inserted(5, 10);
+    journal.Inserted(15, 5);
+    journal.Removed(7, 4);
+    EXPECT_THAT(journal.Take(), ElementsAre(Inserted(5, 11)));
+    journal.Removed(8, 2);
+    journal.Removed(5, 6);
+    EXPECT_THAT(journal.Take(), ElementsAre(Removed(5, 8)));
+    journal.Inserted(5, 3);
+    journal.Removed(6, 4);
+    EXPECT_THAT(journal.Take(), ElementsAre(Inserted(5, 3), Removed(6, 4)));
+}
+
 TEST(RowJournalTest, ChangesOfNeighboursAreOneEntry) {
     RowJournal journal;
     for (const std::uint32_t row : {7u, 8u, 6u, 7u}) journal.Changed(row);
@@ -168,11 +182,13 @@ TEST(RowJournalTest, AFollowerThatAppliesTheStepsHoldsTheList) {
         const auto near = list.empty() ? 0 : std::min(below(list.size()), below(list.size()));
         const auto at = static_cast<std::ptrdiff_t>(near);
         if (kind < 3 || list.empty()) {
-            list.insert(list.begin() + at, value);
-            journal.Inserted(static_cast<std::uint32_t>(at));
+            const std::size_t count = 1 + below(3);
+            list.insert(list.begin() + at, count, value);
+            journal.Inserted(static_cast<std::uint32_t>(at), static_cast<std::uint32_t>(count));
         } else if (kind == 3) {
-            list.erase(list.begin() + at);
-            journal.Removed(static_cast<std::uint32_t>(at));
+            const std::size_t count = 1 + below(std::min<std::size_t>(list.size() - near, 4));
+            list.erase(list.begin() + at, list.begin() + at + static_cast<std::ptrdiff_t>(count));
+            journal.Removed(static_cast<std::uint32_t>(at), static_cast<std::uint32_t>(count));
         } else if (kind == 6) {
             std::shuffle(list.begin(), list.end(), numbers);
             journal.Reordered(static_cast<std::uint32_t>(list.size()));
