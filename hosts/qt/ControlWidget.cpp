@@ -1,6 +1,7 @@
 #include "hosts/qt/ControlWidget.h"
 
 #include <QEvent>
+#include <QFontMetrics>
 #include <QHideEvent>
 #include <QLayout>
 #include <QShowEvent>
@@ -9,6 +10,7 @@
 #include "hosts/qt/BagText.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/Site.h"
+#include "hosts/qt/WidgetPeer.h"
 
 namespace tessel::qt {
 
@@ -173,6 +175,15 @@ void ControlWidget::setBag(const QByteArray& bag) {
         if (!saved) return;
     }
     if (saved || settled_) place(saved ? &*saved : nullptr);
+}
+
+QSize ControlWidget::textArea(int letters, int lines) const {
+    const QFontMetrics metrics = fontMetrics();
+    return {letters * metrics.averageCharWidth(), lines * metrics.lineSpacing()};
+}
+
+void ControlWidget::giveFocusTo(const frame::ChildControl& child) {
+    if (const auto* peer = dynamic_cast<const WidgetPeer*>(child.Peer())) setFocusProxy(peer->widget());
 }
 
 void ControlWidget::setPointer(const QCursor& pointer) { site_->surface()->SetPointer(pointer); }

@@ -77,6 +77,11 @@ class ControlWidget : public QWidget {
     void showEvent(QShowEvent* event) override;
     void hideEvent(QHideEvent* event) override;
 
+    /// Room for so many letters in so many lines.
+    QSize textArea(int letters, int lines) const;
+    /// The widget's focus goes to what shows this child.
+    void giveFocusTo(const frame::ChildControl& child);
+
     /// The pointer over the control where it asks for none of its own.
     void setPointer(const QCursor& pointer);
 
