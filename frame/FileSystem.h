@@ -51,8 +51,13 @@ class FolderListing {
     /// Valid as long as the listing.
     std::string_view Name(std::size_t index) const { return {names_.data() + entries_[index].start, entries_[index].length}; }
 
+    /// Whether the entry is a link, which counts as what it leads to.
+    bool IsLink(std::size_t index) const { return entries_[index].isLink; }
+
     /// Reads what stands on the disk now. 53 when the entry has gone, 70 when it may not be read.
     virtual Status Stat(std::size_t index, FileRecord& record) = 0;
+    /// Reads the bits `hidden` and `system` of an entry, and no more than these take: nothing of the disk where names tell them.
+    virtual Status StatHiding(std::size_t index, std::int32_t& attributes);
     /// Gives back what the listing holds of the system until the next `Stat`: for a listing that is kept while its sub-folders are
     /// listed.
     virtual void Rest() {}
@@ -61,6 +66,7 @@ class FolderListing {
     struct Entry {
         std::uint32_t start;  // of its name, which a NUL ends
         std::uint16_t length;
+        bool isLink = false;
     };
 
     /// False when the names have become too many for a listing (4 GiB).

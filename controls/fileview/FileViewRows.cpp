@@ -241,7 +241,7 @@ std::uint64_t FileViewRows::TimeNumber(std::int64_t seconds) const {
 }
 
 std::int64_t FileViewRows::LocalSeconds(std::int64_t seconds) const {
-    constexpr std::int64_t secondsPerQuarter = 15 * 60;
+    constexpr std::int64_t secondsPerQuarter = 15 * 60, secondsPerWeek = 7 * 24 * 60 * 60;
     // Farther away the texts of a whole quarter might not all exist.
     constexpr std::int64_t wellInside = std::int64_t{60} * 60 * 24 * 365 * 1000;
     const auto reckon = [&](std::int64_t moment) {
@@ -254,13 +254,19 @@ std::int64_t FileViewRows::LocalSeconds(std::int64_t seconds) const {
         return static_cast<std::int64_t>(local.time_since_epoch().count());
     };
     if (seconds < 0 || seconds > wellInside) return reckon(seconds);
-    const std::int64_t quarter = seconds / secondsPerQuarter;
-    Ahead& ahead = ahead_[static_cast<std::size_t>(quarter) % ahead_.size()];
-    if (ahead.quarter != quarter) {
-        const std::int64_t start = quarter * secondsPerQuarter;
-        ahead = {quarter, reckon(start) - start};
-    }
-    return seconds + ahead.seconds;
+    const auto aheadAt = [&](std::int64_t moment) { return reckon(moment) - moment; };
+    const auto spanOf = [&](auto& spans, std::int64_t length) -> Ahead& {
+        const std::int64_t span = seconds / length;
+        Ahead& ahead = spans[static_cast<std::size_t>(span) % spans.size()];
+        if (ahead.span != span) {
+            const std::int64_t start = aheadAt(span * length);
+            ahead = {span, start, length == secondsPerQuarter || start == aheadAt((span + 1) * length)};
+        }
+        return ahead;
+    };
+    // Clocks are not changed and changed back within a week: what holds at both ends holds between them.
+    const Ahead& inWeek = spanOf(aheadInWeeks_, secondsPerWeek);
+    return seconds + (inWeek.isSteady ? inWeek : spanOf(aheadInQuarters_, secondsPerQuarter)).seconds;
 }
 
 }  // namespace tessel::controls

@@ -103,12 +103,14 @@ class FileViewRows final : public child::RowSource {
     std::size_t countedAtOnce_ = 0;
     mutable std::unordered_map<std::int32_t, std::string> types_;
 
-    /// What local time is ahead of Coordinated Universal Time, for quarters of an hour that were asked for lately.
+    /// What local time is ahead of Coordinated Universal Time in a span that was asked for lately.
     struct Ahead {
-        std::int64_t quarter = INT64_MIN;
+        std::int64_t span = INT64_MIN;
         std::int64_t seconds = 0;
+        bool isSteady = true;  // throughout the span
     };
-    mutable std::array<Ahead, 256> ahead_{};
+    mutable std::array<Ahead, 1024> aheadInWeeks_{};
+    mutable std::array<Ahead, 256> aheadInQuarters_{};  // of an hour
 };
 
 }  // namespace tessel::controls

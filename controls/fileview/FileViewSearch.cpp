@@ -76,7 +76,7 @@ void FileView::SearchFolder(const std::string& root, bool subdirectories, const 
         const std::optional<std::int32_t> attributes = place.attributes[place.nextFolder];
         if (!attributes || !AttributesAllowed(*attributes)) {
             ++place.nextFolder;
-        } else if (subdirectories && !own.AddCancelled) {
+        } else if (subdirectories && !own.AddCancelled && !place.listing->IsLink(place.nextFolder)) {
             PlaceInTree below(JoinedPath(place.folder, place.listing->Name(place.nextFolder)));
             places.push_back(std::move(below));
             SearchFiles(places.back(), pattern);
@@ -111,9 +111,9 @@ void FileView::SearchFiles(PlaceInTree& place, const std::string& pattern) {
         AddToTotal(static_cast<double>(file.size));
     }
     for (std::size_t index = 0; index < listing.FolderCount(); ++index) {
-        FileRecord folder;
-        const bool failed = listing.Stat(index, folder).Failed();
-        place.attributes.push_back(failed ? std::nullopt : std::optional(folder.attributes));
+        std::int32_t attributes = 0;
+        const bool failed = listing.StatHiding(index, attributes).Failed();
+        place.attributes.push_back(failed ? std::nullopt : std::optional(attributes));
     }
     listing.Rest();
 }

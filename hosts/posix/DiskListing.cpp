@@ -34,7 +34,7 @@ DiskUser DiskUser::OfThisProcess() {
 
 frame::FileRecord RecordMaker::RecordOf(std::string_view name, const EntryFacts& entry) {
     frame::FileRecord record;
-    if (name.starts_with('.')) record.attributes |= attributes::hidden;
+    record.attributes = HidingOf(name);
     if (!user.MayWrite(entry.mode, entry.owner, entry.group)) record.attributes |= attributes::readOnly;
     if (entry.IsFolder()) {
         record.attributes |= attributes::directory;
@@ -59,7 +59,9 @@ frame::Status DiskListing::Open(std::string_view path) {
     std::vector<Entry> files;
     for (FolderReader::Entry entry; reader.Next(entry);) {
         if (!Add({entry.name, entry.length})) return errors::outOfMemory;
-        if (!LeadsToFolder(entry)) {
+        const FolderReader::Kind kind = KindOf(entry);
+        entries_.back().isLink = kind == FolderReader::Kind::Link;
+        if (!LeadsToFolder(entry.name, kind)) {
             files.push_back(entries_.back());
             entries_.pop_back();
         }
@@ -72,11 +74,20 @@ frame::Status DiskListing::Open(std::string_view path) {
     return {};
 }
 
-bool DiskListing::LeadsToFolder(const FolderReader::Entry& entry) {
-    if (entry.kind == FolderReader::Kind::Folder) return true;
-    if (entry.kind == FolderReader::Kind::File) return false;
+/// Not every file system tells the kind with the name.
+FolderReader::Kind DiskListing::KindOf(const FolderReader::Entry& entry) {
+    using Kind = FolderReader::Kind;
     EntryFacts facts;
-    return maker_.facts.Follow(folder_.Number(), entry.name, facts) == 0 && facts.IsFolder();
+    if (entry.kind != Kind::Unknown) return entry.kind;
+    if (maker_.facts.Itself(folder_.Number(), entry.name, facts) != 0) return Kind::File;
+    if (facts.IsLink()) return Kind::Link;
+    return facts.IsFolder() ? Kind::Folder : Kind::File;
+}
+
+bool DiskListing::LeadsToFolder(const char* name, FolderReader::Kind kind) {
+    if (kind != FolderReader::Kind::Link) return kind == FolderReader::Kind::Folder;
+    EntryFacts facts;
+    return maker_.facts.Follow(folder_.Number(), name, facts) == 0 && facts.IsFolder();
 }
 
 /// Orders by the eight bytes behind what all names have in common, which mostly tell any two apart, and by the rest where they
@@ -119,6 +130,11 @@ frame::Status DiskListing::Stat(std::size_t index, frame::FileRecord& record) {
     const int error = maker_.facts.FollowOrItself(folder_.Number(), names_.data() + entry.start, facts);
     if (error == 0) record = maker_.RecordOf(Name(index), facts);
     return StatusOf(error);
+}
+
+frame::Status DiskListing::StatHiding(std::size_t index, std::int32_t& attributes) {
+    attributes = RecordMaker::HidingOf(Name(index));
+    return {};
 }
 
 frame::Status CountEntries(FactReader& facts, std::string_view path, frame::FolderCounts& counts) {

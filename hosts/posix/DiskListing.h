@@ -32,6 +32,8 @@ struct RecordMaker {
     TypeTexts types;
 
     frame::FileRecord RecordOf(std::string_view name, const EntryFacts& entry);
+    /// Hidden is what begins with a point.
+    static std::int32_t HidingOf(std::string_view name) { return name.starts_with('.') ? frame::attributes::hidden : 0; }
 };
 
 /// The entries of a folder on the disk, which stays open for the reading of records.
@@ -42,10 +44,12 @@ class DiskListing final : public frame::FolderListing {
     /// Reads the names.
     frame::Status Open(std::string_view path);
     frame::Status Stat(std::size_t index, frame::FileRecord& record) override;
+    frame::Status StatHiding(std::size_t index, std::int32_t& attributes) override;
     void Rest() override { folder_.Close(); }
 
   private:
-    bool LeadsToFolder(const FolderReader::Entry& entry);
+    FolderReader::Kind KindOf(const FolderReader::Entry& entry);
+    bool LeadsToFolder(const char* name, FolderReader::Kind kind);
     void Order(std::size_t first, std::size_t end);
 
     RecordMaker& maker_;

@@ -113,15 +113,17 @@ TypeTexts::TypeTexts(std::vector<std::string> folders, std::vector<std::string> 
 std::int32_t TypeTexts::IdOf(std::string_view fileName) {
     const std::string_view extension = TypeExtension(fileName);
     if (extension.empty()) return plainId;
-    if (extension == lastExtension_) return lastId_;
+    const auto byte = [](char unit) { return static_cast<std::size_t>(static_cast<unsigned char>(unit)); };
+    Recent& recent = recent_[(extension.size() + byte(extension.front()) * 3 + byte(extension.back()) * 5) % recent_.size()];
+    if (extension == recent.extension) return recent.id;
     auto known = ids_.find(extension);
     if (known == ids_.end()) {
         known = ids_.emplace(std::string(extension), static_cast<std::int32_t>(texts_.size())).first;
         extensions_.emplace_back(extension);
         texts_.emplace_back();
     }
-    lastExtension_ = extension;
-    return lastId_ = known->second;
+    recent = {known->first, known->second};
+    return recent.id;
 }
 
 std::string TypeTexts::Text(std::int32_t id) {

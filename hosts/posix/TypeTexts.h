@@ -1,5 +1,6 @@
 #pragma once
 
+#include <array>
 #include <cstdint>
 #include <string>
 #include <string_view>
@@ -19,6 +20,8 @@ class TypeTexts {
     /// `folders` are those that hold a folder "mime", the one that counts most first; `languages` the user's, the first one first
     /// ("de_AT", "de"). English is always understood.
     TypeTexts(std::vector<std::string> folders, std::vector<std::string> languages);
+    TypeTexts(const TypeTexts&) = delete;
+    TypeTexts& operator=(const TypeTexts&) = delete;
 
     static constexpr std::int32_t folderId = 0, plainId = 1;
     /// The number of a file's type; equal for equal extensions.
@@ -30,6 +33,11 @@ class TypeTexts {
     struct Glob {
         int weight;
         std::string type;
+    };
+    /// An extension that was asked for lately: a folder has few, and they come by turns.
+    struct Recent {
+        std::string_view extension = {};  // a key of `ids_`
+        std::int32_t id = plainId;
     };
     struct TextHash {
         using is_transparent = void;
@@ -46,8 +54,7 @@ class TypeTexts {
     std::vector<std::string> folders_, languages_;
     ByText<std::int32_t> ids_;                     // by extension, as it is written
     std::vector<std::string> extensions_, texts_;  // by id; a text is empty until it was asked for
-    std::string lastExtension_;
-    std::int32_t lastId_ = plainId;
+    std::array<Recent, 64> recent_{};
     bool read_ = false;
     ByText<Glob> exact_, caseless_;
 };

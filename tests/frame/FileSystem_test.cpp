@@ -8,8 +8,13 @@ namespace {
 class Names final : public FolderListing {
   public:
     using FolderListing::Add;
-    Status Stat(std::size_t, FileRecord&) override { return {}; }
+    Status Stat(std::size_t index, FileRecord& record) override {
+        constexpr int permissionDenied = 70;
+        record.attributes = attributes::hidden | attributes::readOnly;
+        return index == 0 ? Status() : Status(permissionDenied);
+    }
     void CallThemFolders() { folders_ = Count(); }
+    void CallTheLastALink() { entries_.back().isLink = true; }
 };
 
 TEST(FolderListing, KeepsTheNamesThatItIsGiven) {
@@ -27,6 +32,25 @@ TEST(FolderListing, KeepsTheNamesThatItIsGiven) {
     EXPECT_TRUE(names.IsFolder(0));
     EXPECT_FALSE(names.IsFolder(1));
     EXPECT_EQ(names.FolderCount(), 1u);
+}
+
+TEST(FolderListing, KnowsALink) {
+    Names names;
+    names.Add("a");
+    names.Add("b");
+    names.CallTheLastALink();
+    EXPECT_FALSE(names.IsLink(0));
+    EXPECT_TRUE(names.IsLink(1));
+}
+
+TEST(FolderListing, ReadsWhatHidesAnEntryLikeTheRest) {
+    Names names;
+    names.Add("a");
+    names.Add("b");
+    std::int32_t hiding = 0;
+    EXPECT_EQ(names.StatHiding(0, hiding).Number(), 0);
+    EXPECT_EQ(hiding, attributes::hidden);
+    EXPECT_EQ(names.StatHiding(1, hiding).Number(), 70);
 }
 
 class Countdown final : public TreeSize {

@@ -81,6 +81,16 @@ TEST_F(FileViewIcons, AFileWithoutExtensionEndsWithoutAnImage) {
     EXPECT_EQ(view.Image16.ListImages.Item(6).Key(), "");
 }
 
+TEST_F(FileViewIcons, EveryFileWithoutExtensionAddsAnImageWithoutKey) {
+    stage.File("C:\\x\\LICENSE");
+    stage.File("C:\\x\\README");
+    List("C:\\x");
+    EXPECT_EQ(SmallIcons(), " | ");
+    EXPECT_THAT(stage.asked, ElementsAre("S C:\\x\\LICENSE", "L C:\\x\\LICENSE", "S C:\\x\\README", "L C:\\x\\README"));
+    EXPECT_EQ(view.Image16.ListImages.Count(), 7);
+    EXPECT_EQ(view.Image32.ListImages.Count(), 5);
+}
+
 TEST_F(FileViewIcons, AnIconThatTheSystemLacksIsAskedForAgain) {
     stage.hasIcon = [](const std::string&) { return false; };
     stage.File("C:\\x\\a.txt");

@@ -28,6 +28,8 @@ TEST(FilterMatch, CaseIsIgnoredInEveryScript) {
     EXPECT_TRUE(FilterMatch("README.TXT", "readme.*"));
     EXPECT_TRUE(FilterMatch("\u00C4pfel", "\u00E4PFEL"));
     EXPECT_TRUE(FilterMatch("\u0414\u043E\u043C", "\u0434*"));
+    EXPECT_TRUE(FilterMatch("300 \u212A", "*k"));  // the sign of Kelvin
+    EXPECT_TRUE(FilterMatch("k", "*\u212A"));
     EXPECT_TRUE(FilterMatch("B", "[abc]"));
     EXPECT_FALSE(FilterMatch("B", "[!abc]"));
 }

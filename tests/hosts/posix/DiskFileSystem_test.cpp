@@ -236,6 +236,35 @@ TEST_F(DiskFileSystemTest, ALinkIsWhatItLeadsTo) {
     EXPECT_EQ(disk_.OpenForReading(folder_ / "tonone", file).Number(), 53);
 }
 
+TEST_F(DiskFileSystemTest, AListingTellsWhichEntriesAreLinks) {
+    folder_.Make("sub");
+    folder_.Write("a.txt", "a");
+    fs::create_symlink("sub", folder_ / "tosub");
+    fs::create_symlink("a.txt", folder_ / "toa");
+    fs::create_symlink("none", folder_ / "tonone");
+    fs::create_hard_link(folder_ / "a.txt", folder_ / "b.txt");
+    std::unique_ptr<frame::FolderListing> listing;
+    disk_.List(folder_.Path(), listing).Check();
+    std::string links;
+    for (std::size_t i = 0; i < listing->Count(); ++i)
+        if (listing->IsLink(i)) links += std::string(listing->Name(i)) + (listing->IsFolder(i) ? "/ " : " ");
+    EXPECT_EQ(links, "tosub/ toa tonone ");
+}
+
+TEST_F(DiskFileSystemTest, HidingIsToldByTheNameAlone) {
+    folder_.Make(".git");
+    folder_.Make("sub");
+    std::unique_ptr<frame::FolderListing> listing;
+    disk_.List(folder_.Path(), listing).Check();
+    for (std::size_t i = 0; i < listing->Count(); ++i) {
+        std::int32_t hiding = -1;
+        FileRecord record;
+        listing->StatHiding(i, hiding).Check();
+        listing->Stat(i, record).Check();
+        EXPECT_EQ(hiding, record.attributes & (attributes::hidden | attributes::system)) << listing->Name(i);
+    }
+}
+
 TEST_F(DiskFileSystemTest, TreesAreMeasuredWithoutLinks) {
     folder_.Make("sub");
     folder_.Write("sub/a.txt", "123");
