@@ -164,6 +164,7 @@ frame::PictureRef ScriptedPictures::LoadPicture(const std::string& fileName) {
 
 frame::PictureRef ScriptedPictures::FileIcon(const std::string& path, int flags) {
     log_.Add({"icon", path, flags});
+    if (onIcon) onIcon(path);
     bool known = true;
     if (!icons.empty()) {
         known = icons.front();

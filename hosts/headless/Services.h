@@ -19,7 +19,12 @@ class MemoryDisk;
 class ScriptedLoop final : public frame::MessageLoop {
   public:
     explicit ScriptedLoop(Log& log) : log_(log) {}
-    void Turn() override { log_.Add({"yield"}); }
+    void Turn() override {
+        log_.Add({"yield"});
+        if (onTurn) onTurn();
+    }
+
+    std::function<void()> onTurn;  ///< what comes in meanwhile
 
   private:
     Log& log_;
@@ -126,6 +131,7 @@ class ScriptedPictures final : public frame::PictureLoader {
     frame::PictureRef FileIcon(const std::string& path, int flags) override;
 
     std::deque<bool> icons;  ///< whether the system has an icon for the next path asked; true when the queue is empty
+    std::function<void(const std::string&)> onIcon;  ///< what happens while it is asked for that of a path
 
   private:
     Log& log_;

@@ -1,6 +1,8 @@
 #include "hosts/qt/ListHeader.h"
 
+#include <QPixmap>
 #include <QScopedValueRollback>
+#include <QStyleOptionHeader>
 
 #include "hosts/qt/Convert.h"
 
@@ -35,9 +37,10 @@ bool ListHeader::Follow() {
     const std::uint32_t imagesRevision = images ? images->Revision() : 0;
     setSectionsMovable(list_->AllowColumnReorder());
     if (images != images_ || imagesRevision != imagesRevision_) viewport()->update();
+    const bool otherHeight = (images != nullptr) != (images_ != nullptr);
     images_ = images;
     imagesRevision_ = imagesRevision;
-    if (headers.Revision() == revision_) return false;
+    if (headers.Revision() == revision_) return otherHeight;
     revision_ = headers.Revision();
     const QScopedValueRollback following(following_, true);
     for (int column = 0; column < count(); ++column) {
@@ -53,6 +56,17 @@ bool ListHeader::Follow() {
     }
     viewport()->update();
     return true;
+}
+
+QSize ListHeader::sizeHint() const {
+    const QSize size = QHeaderView::sizeHint();
+    if (!images_) return size;
+    QStyleOptionHeader option;
+    initStyleOption(&option);
+    const int side = style()->pixelMetric(QStyle::PM_SmallIconSize, nullptr, this);
+    option.icon = QPixmap(side, side);
+    option.text = "A";
+    return size.expandedTo({0, style()->sizeFromContents(QStyle::CT_HeaderSection, &option, {}, this).height()});
 }
 
 }  // namespace tessel::qt

@@ -22,7 +22,7 @@ class FileViewIcons : public testing::Test {
         return line;
     }
     void List(const std::string& path) {
-        stage.asked.clear();
+        stage.Asked();
         view.SetPathRoot(path);
     }
     Stage stage;
@@ -33,10 +33,10 @@ TEST_F(FileViewIcons, AnExtensionIsAskedForOnceInEachSize) {
     stage.File("C:\\x\\a.txt");
     stage.File("C:\\x\\b.TXT");
     List("C:\\x");
-    EXPECT_THAT(stage.asked, ElementsAre("S C:\\x\\a.txt", "L C:\\x\\a.txt"));
+    EXPECT_THAT(stage.Asked(), ElementsAre("S C:\\x\\a.txt", "L C:\\x\\a.txt"));
     EXPECT_EQ(frame::FoldCase(SmallIcons()), "txt | txt");
     List("C:\\x");
-    EXPECT_THAT(stage.asked, IsEmpty());
+    EXPECT_THAT(stage.Asked(), IsEmpty());
     EXPECT_EQ(Keys(view.Image32), "Drive Unavailable | FolderUnavailable | File Folder | txt");
 }
 
@@ -47,11 +47,11 @@ TEST_F(FileViewIcons, EachProgramHasItsOwnUntilTheNextPaint) {
     EXPECT_EQ(SmallIcons(), "one.exe | two.EXE");
     EXPECT_EQ(Keys(view.Image32), "Drive Unavailable | FolderUnavailable | File Folder | one.exe | two.EXE");
     EXPECT_EQ(view.Image16.ListImages.FindKey("one.exe")->Tag().ToText(), "exe");
-    EXPECT_EQ(stage.asked.size(), 4u);
+    EXPECT_EQ(stage.Asked().size(), 4u);
     stage.Remove("C:\\x\\one.exe");
     List("C:\\x");
     EXPECT_EQ(Keys(view.Image32), "Drive Unavailable | FolderUnavailable | File Folder | two.EXE");
-    EXPECT_EQ(stage.asked.size(), 2u);
+    EXPECT_EQ(stage.Asked().size(), 2u);
 }
 
 TEST_F(FileViewIcons, AProgramThatIsAddedAgainFindsItsImage) {
@@ -92,12 +92,12 @@ TEST_F(FileViewIcons, EveryFileWithoutExtensionAddsAnImageWithoutKey) {
 }
 
 TEST_F(FileViewIcons, AnIconThatTheSystemLacksIsAskedForAgain) {
-    stage.hasIcon = [](const std::string&) { return false; };
+    stage.host.pictures.icons = {false, false, false, false};
     stage.File("C:\\x\\a.txt");
     stage.File("C:\\x\\b.txt");
     List("C:\\x");
     EXPECT_EQ(SmallIcons(), " | ");
-    EXPECT_EQ(stage.asked.size(), 4u);
+    EXPECT_EQ(stage.Asked().size(), 4u);
     EXPECT_EQ(Rows(view), "a.txt | b.txt");
 }
 
@@ -106,7 +106,7 @@ TEST_F(FileViewIcons, FoldersHaveTheImageOfTheirType) {
     stage.Disk().SetFolder("C:\\x\\special", {.type = "Briefcase"}).Check();
     List("C:\\x");
     EXPECT_EQ(SmallIcons(), "File Folder | Briefcase");
-    EXPECT_THAT(stage.asked, ElementsAre("S C:\\x\\special", "L C:\\x\\special"));
+    EXPECT_THAT(stage.Asked(), ElementsAre("S C:\\x\\special", "L C:\\x\\special"));
 }
 
 TEST_F(FileViewIcons, DrivesHaveTheImageOfTheirKind) {
@@ -114,7 +114,7 @@ TEST_F(FileViewIcons, DrivesHaveTheImageOfTheirKind) {
     stage.Disk().SetDrive("N", {.type = frame::driveTypes::network, .share = "\\\\s\\n", .ready = false}).Check();
     List("My Computer");
     EXPECT_EQ(SmallIcons(), "Local Disk | Local Disk | Drive Unavailable");
-    EXPECT_THAT(stage.asked, ElementsAre("S C:\\", "L C:\\"));
+    EXPECT_THAT(stage.Asked(), ElementsAre("S C:\\", "L C:\\"));
 }
 
 TEST_F(FileViewIcons, AnItemCanBeGivenItsIcon) {
@@ -132,21 +132,20 @@ TEST_F(FileViewIcons, AnItemCanBeGivenItsIcon) {
 
 TEST_F(FileViewIcons, TheIconOfATypeComesByWayOfATemporaryFile) {
     std::string during;
-    stage.hasIcon = [&](const std::string& path) {
+    stage.host.pictures.onIcon = [&](const std::string& path) {
         EXPECT_TRUE(stage.Disk().FileExists(path));
         during = path;
-        return true;
     };
     EXPECT_TRUE(view.ImageLoadFileType("txt"));
     EXPECT_EQ(during.substr(0, 8), "C:\\Temp\\");
     EXPECT_EQ(during.substr(during.size() - 4), ".txt");
     EXPECT_FALSE(stage.Disk().FileExists(during));
     EXPECT_NE(view.Image32.ListImages.FindKey("txt"), nullptr);
-    stage.asked.clear();
+    stage.Asked();
     EXPECT_TRUE(view.ImageLoadFileType("TXT"));
-    EXPECT_THAT(stage.asked, IsEmpty());
+    EXPECT_THAT(stage.Asked(), IsEmpty());
     EXPECT_FALSE(view.ImageLoadFileType(""));
-    stage.hasIcon = [](const std::string&) { return false; };
+    stage.host.pictures.icons = {false, false};
     EXPECT_FALSE(view.ImageLoadFileType("doc"));
 }
 

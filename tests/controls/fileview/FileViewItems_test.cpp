@@ -23,7 +23,7 @@ class FileViewItems : public testing::Test {
         stage.File("C:\\x\\b.txt", 2);
         stage.File("C:\\x\\sub\\c.txt", 3);
         stage.ShowPath("C:\\x");
-        stage.changes.clear();
+        stage.Changes();
     }
     Stage stage;
     FileView& view = stage.View();
@@ -47,20 +47,20 @@ TEST_F(FileViewItems, TheCursorReadsTheCurrentItem) {
 
 TEST_F(FileViewItems, AnIndexOutsideIsPassedOver) {
     view.SetItemIndex(2);
-    stage.changes.clear();
+    stage.Changes();
     for (const std::int32_t index : {0, -1, 4, 1000}) {
         view.SetItemIndex(index);
         EXPECT_EQ(view.ItemIndex(), 2);
     }
-    EXPECT_THAT(stage.changes, IsEmpty());
+    EXPECT_THAT(stage.Changes(), IsEmpty());
     view.SetItemIndex(3);
-    EXPECT_THAT(stage.changes, ElementsAre("ItemIndex"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("ItemIndex"));
 }
 
 TEST_F(FileViewItems, WithoutACurrentItemGettersAreEmptyAndSettersDoNothing) {
     stage.Folder("C:\\none");
     stage.ShowPath("C:\\none");
-    stage.changes.clear();
+    stage.Changes();
     EXPECT_EQ(view.ItemIndex(), 0);
     EXPECT_EQ(view.ItemDisplayName(), "");
     EXPECT_EQ(view.ItemName(), "");
@@ -79,7 +79,7 @@ TEST_F(FileViewItems, WithoutACurrentItemGettersAreEmptyAndSettersDoNothing) {
     view.SetItemSelected(true);
     view.SetItemTag("x");
     view.SetSelectedItem(1);
-    EXPECT_THAT(stage.changes, IsEmpty());
+    EXPECT_THAT(stage.Changes(), IsEmpty());
 }
 
 TEST_F(FileViewItems, TheLabelChangesAndTheNameStays) {
@@ -89,7 +89,7 @@ TEST_F(FileViewItems, TheLabelChangesAndTheNameStays) {
     EXPECT_EQ(view.ItemName(), "a.txt");
     EXPECT_EQ(view.ItemPath(), "C:\\x\\a.txt");
     EXPECT_EQ(SubItem(view, 2, 12), "a.txt");
-    EXPECT_THAT(stage.changes, ElementsAre("ItemIndex", "ItemDisplayName"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("ItemIndex", "ItemDisplayName"));
 }
 
 TEST_F(FileViewItems, SettingTheNameRenames) {
@@ -111,11 +111,11 @@ TEST_F(FileViewItems, SettingTheNameToTheSameInAnotherCaseChangesTheLabelOnly) {
 
 TEST_F(FileViewItems, SettingTheNameWithAnotherExtensionAsksFirst) {
     view.SetItemIndex(2);
-    stage.others.dialogs.answers = {frame::msgbox::answerNo};
+    stage.host.dialogs.answers = {frame::msgbox::answerNo};
     view.SetItemName("a.doc");
     EXPECT_TRUE(stage.Disk().FileExists("C:\\x\\a.txt"));
     EXPECT_EQ(view.ItemName(), "a.txt");
-    stage.others.dialogs.answers = {frame::msgbox::answerYes};
+    stage.host.dialogs.answers = {frame::msgbox::answerYes};
     view.SetItemName("a.doc");
     EXPECT_TRUE(stage.Disk().FileExists("C:\\x\\a.doc"));
 }
@@ -150,7 +150,7 @@ TEST_F(FileViewItems, AnIconThatTheListLacksIsPassedOver) {
     view.SetItemSmallIcon("SortUp");
     view.SetItemSmallIcon("no such key");
     EXPECT_EQ(view.ItemSmallIcon(), "SortUp");
-    EXPECT_THAT(stage.changes, ElementsAre("ItemIndex", "ItemIcon", "ItemIcon", "ItemSmallIcon", "ItemSmallIcon"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("ItemIndex", "ItemIcon", "ItemIcon", "ItemSmallIcon", "ItemSmallIcon"));
 }
 
 TEST_F(FileViewItems, SelectionAndTagBelongToTheRow) {
@@ -180,7 +180,7 @@ TEST_F(FileViewItems, SettingSelectedItemTestsTheNewValueAndSelectsTheStoredOne)
     EXPECT_EQ(ErrorOf([&] { view.SetSelectedItem(4); }), 0);
     EXPECT_EQ(view.SelectedItem(), 0);
     const frame::MemoryBag bag(frame::MemoryBag::Contents{{"SelectedItem", Variant(3)}, {"Path", Variant("C:\\x")}});
-    headless::HeadlessHost host;
+    test::HostUnderTest host;
     for (const char* name : {"a", "b", "c"}) host.files.SetFile(std::string("C:\\x\\") + name, {}).Check();
     FileView& loaded = host.Create<FileView>("FileView1", {.saved = &bag});
     loaded.SetSelectedItem(1);
@@ -252,7 +252,7 @@ TEST(FileViewWithoutAFolderInHand, AddsNothingForAPathThatDoesNotExist) {
 }
 
 TEST_F(FileViewItems, TheFolderHandledLastIsSharedByAllListsOfAHost) {
-    headless::HeadlessHost host;
+    test::HostUnderTest host;
     host.files.SetFolder("C:\\x\\sub", {}).Check();
     FileView& one = host.Create<FileView>("FileView1");
     FileView& two = host.Create<FileView>("FileView2");
@@ -297,10 +297,10 @@ TEST_F(FileViewItems, ImagesAreThoseOfTheSizeChosen) {
     EXPECT_EQ(view.ImageIndex(), 99);
     EXPECT_EQ(view.ImageKey(), "");
     EXPECT_EQ(view.ImageTag(), "");
-    stage.changes.clear();
+    stage.Changes();
     view.SetImageKey("x");
     view.SetImageTag("x");
-    EXPECT_THAT(stage.changes, IsEmpty());
+    EXPECT_THAT(stage.Changes(), IsEmpty());
 }
 
 TEST_F(FileViewItems, KeyAndTagOfAnImageCanBeSet) {

@@ -210,7 +210,7 @@ TEST_P(FileViewReentrance, TheControlMayBeDestroyedInsideAListing) {
         stage.Frame(), [] { return std::string("test"); }, [&] { view.SetPathRoot("C:\\x"); });
     EXPECT_EQ(times, 1);
     EXPECT_FALSE(stage.Lives());
-    EXPECT_TRUE(stage.others.errors.reports.empty());
+    EXPECT_TRUE(stage.host.errors.reports.empty());
 }
 
 TEST_P(FileViewReentrance, TheControlMayBeDestroyedWhenItIsShown) {
@@ -219,7 +219,7 @@ TEST_P(FileViewReentrance, TheControlMayBeDestroyedWhenItIsShown) {
     At([&] { stage.Destroy(); });
     stage.TheSite().Show();
     EXPECT_EQ(times, 1);
-    EXPECT_TRUE(stage.others.errors.reports.empty());
+    EXPECT_TRUE(stage.host.errors.reports.empty());
 }
 
 std::string NameOfMoment(const testing::TestParamInfo<Moment>& tested) { return tested.param.name; }
@@ -246,7 +246,7 @@ TEST_F(FileViewReentranceElsewhere, TheControlMayBeDestroyedInARefresh) {
         if (std::string(name) == "RefreshFoundChanges") inner.handlers.On(fileview::RefreshFoundChanges, destroy);
         inner.Tick();
         EXPECT_FALSE(inner.Lives()) << name;
-        EXPECT_TRUE(inner.others.errors.reports.empty()) << name;
+        EXPECT_TRUE(inner.host.errors.reports.empty()) << name;
     }
 }
 
@@ -257,7 +257,7 @@ TEST_F(FileViewReentranceElsewhere, AnErrorInARefreshIsPassedOver) {
     stage.handlers.On(fileview::RefreshFoundChanges, [] { throw ControlError(applicationError); });
     stage.Tick();
     EXPECT_EQ(stage.Events(), "AfterPaint RefreshFoundChanges");
-    EXPECT_TRUE(stage.others.errors.reports.empty());
+    EXPECT_TRUE(stage.host.errors.reports.empty());
 }
 
 TEST_F(FileViewReentranceElsewhere, RowsMayGoWhileARefreshAddsOthers) {
@@ -277,7 +277,7 @@ TEST_F(FileViewReentranceElsewhere, TheControlMayBeDestroyedInASearch) {
     frame::Entry::Run(
         stage.Frame(), [] { return std::string("test"); }, [&] { view.Search("*", "C:\\x", true); });
     EXPECT_FALSE(stage.Lives());
-    EXPECT_TRUE(stage.others.errors.reports.empty());
+    EXPECT_TRUE(stage.host.errors.reports.empty());
 }
 
 TEST_F(FileViewReentranceElsewhere, TheControlMayBeDestroyedInATurnOfASearch) {

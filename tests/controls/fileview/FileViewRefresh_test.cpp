@@ -308,10 +308,10 @@ TEST_F(FileViewRefresh, RefreshGoesByTheRootAndNotByThePath) {
 TEST_F(FileViewRefresh, TheTimerTicksByItsInterval) {
     stage.Folder("C:\\x\\sub");
     stage.ShowPath("C:\\x");
-    stage.others.clock.Advance(60'000);
+    stage.host.clock.Advance(60'000);
     EXPECT_EQ(stage.Events(), "");
     view.SetRefreshInterval(1'000);
-    stage.others.clock.Advance(3'500);
+    stage.host.clock.Advance(3'500);
     EXPECT_EQ(stage.Events(), "AfterPaint AfterPaint AfterPaint");
 }
 

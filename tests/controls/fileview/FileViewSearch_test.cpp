@@ -87,7 +87,7 @@ TEST_F(FileViewSearch, PathIsEmptyAndTheRootStays) {
     view.SetItemIndex(2);
     EXPECT_EQ(view.ItemPath(), "c.txt");
     EXPECT_EQ(SubItem(view, 2, 6), "C:\\x\\one");
-    EXPECT_TRUE(stage.changes.back() == "ItemIndex");
+    EXPECT_TRUE(stage.Changes().back() == "ItemIndex");
 }
 
 TEST_F(FileViewSearch, ResultsAreNotRefreshed) {

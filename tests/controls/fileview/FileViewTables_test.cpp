@@ -138,7 +138,7 @@ TEST(FileViewTables, ALoadedControlRefreshesEveryTenSeconds) {
     stage.Folder("C:\\x\\sub");
     stage.TheSite().Show();
     stage.Events();
-    stage.others.clock.Advance(10'000);
+    stage.host.clock.Advance(10'000);
     EXPECT_EQ(stage.Events(), "AfterPaint");
 }
 
@@ -147,7 +147,7 @@ TEST(FileViewTables, ALoadPaintsNothingAndReportsOnlyThePictures) {
     Stage stage({.saved = &bag, .show = false});
     EXPECT_EQ(stage.Events(), "");
     EXPECT_EQ(stage.View().FolderPath(), "");
-    EXPECT_THAT(stage.changes, testing::ElementsAre("MouseIcon", "Picture"));
+    EXPECT_THAT(stage.Changes(), testing::ElementsAre("MouseIcon", "Picture"));
     EXPECT_EQ(stage.View().ListFiles.LabelEdit(), child::ListLabelEditConstants::Automatic);
 }
 
@@ -196,7 +196,7 @@ TEST(FileViewTables, StockPropertiesAreThoseOfTheList) {
     EXPECT_EQ(view.ListFiles.View(), child::ListViewConstants::Icon);
     EXPECT_TRUE(view.ListFiles.MultiSelect());
     EXPECT_EQ(view.ListFiles.BorderStyle(), child::ListBorderConstants::None);
-    EXPECT_THAT(stage.changes, testing::ElementsAre("GridLines", "View", "MultiSelect", "BorderStyle"));
+    EXPECT_THAT(stage.Changes(), testing::ElementsAre("GridLines", "View", "MultiSelect", "BorderStyle"));
 }
 
 TEST(FileViewTables, MethodsAreReachedByName) {

@@ -2,15 +2,12 @@
 
 #include <cstdint>
 #include <functional>
-#include <memory>
-#include <set>
 #include <string>
-#include <string_view>
 #include <utility>
 #include <vector>
 
 #include "controls/fileview/FileView.h"
-#include "hosts/headless/HeadlessHost.h"
+#include "tests/HostUnderTest.h"
 
 /// What the tests of the list of files share.
 namespace tessel::controls::fileviewtest {
@@ -25,13 +22,16 @@ class Stage {
         bool designTime = false;
         const frame::PropertyBag* saved = nullptr;
         bool show = true;
+        bool heard = true;                   ///< somebody listens to each event
+        frame::FileSystem* files = nullptr;  ///< in the place of the memory disk
     };
 
     Stage() : Stage(Options()) {}
-    explicit Stage(const Options& options) : site_(std::make_unique<StageSite>(*this)), view_(NewView()) {
-        site_->ambient.userMode = !options.designTime;
-        site_->Start(options.saved, width, height);
-        if (options.show) site_->Show();
+    explicit Stage(const Options& options) : host(options.files), view_(NewView(options)) {
+        host.loop.onTurn = [this] {
+            ++turns;
+            if (onTurn) onTurn();
+        };
         Events();
     }
     ~Stage() { Destroy(); }
@@ -39,14 +39,14 @@ class Stage {
     Stage& operator=(const Stage&) = delete;
 
     FileView& View() { return view_; }
-    frame::Host& Frame() { return frame_; }
-    headless::MemoryDisk& Disk() { return others.files; }
-    frame::Site& TheSite() { return *site_; }
-    bool Lives() const { return site_ != nullptr; }
+    frame::Host& Frame() { return host.Frame(); }
+    headless::MemoryDisk& Disk() { return host.files; }
+    frame::Site& TheSite() { return *view_.Site(); }
+    bool Lives() { return host.FindSite(name) != nullptr; }
     void Destroy() {
-        if (site_) frame_.Retire(std::move(site_));
+        if (Lives()) host.Destroy(view_);
     }
-    void Save(frame::PropertyBag& bag) { site_->Save(bag); }
+    void Save(frame::PropertyBag& bag) { TheSite().Save(bag); }
 
     // Setting up the disk. Times are seconds since 1970.
     void File(const std::string& path, std::int64_t size = 0, std::int64_t created = 0, std::int64_t modified = 0,
@@ -62,8 +62,8 @@ class Stage {
     void ShowPath(const std::string& path) {
         view_.SetPathRoot(path);
         Events();
+        Asked();
         turns = 0;
-        asked.clear();
     }
     void Tick() { view_.RefreshTimer.TimerInput(); }
 
@@ -80,96 +80,60 @@ class Stage {
             if (event.find("AddItem") == std::string::npos) line += (line.empty() ? "" : " ") + event;
         return line;
     }
+    /// The properties that were reported since the last call.
+    std::vector<std::string> Changes() {
+        ReadLog();
+        return std::exchange(changes_, {});
+    }
+    /// The icons that the system was asked for since the last call: "S C:\a.txt".
+    std::vector<std::string> Asked() {
+        ReadLog();
+        return std::exchange(asked_, {});
+    }
 
-    frame::Handlers handlers;          ///< the application's
-    std::set<std::string> unwanted;    ///< events that nobody listens to
-    std::function<void()> onTurn;      ///< what comes in while the message loop has a turn
-    std::vector<std::string> changes;  ///< properties that were reported
-    std::vector<std::string> asked;    ///< icons that the system was asked for: "S C:\a.txt"
-    std::function<bool(const std::string&)> hasIcon = [](const std::string&) { return true; };
+    std::function<void()> onTurn;  ///< what comes in while the message loop has a turn
     int turns = 0;
-    headless::HeadlessHost others;  ///< lends what no test watches
+    test::HostUnderTest host;
 
   private:
-    struct Nobody final : frame::Siblings {
-        int Count() const override { return 0; }
-        frame::Object& Item(int) override { throw frame::ControlError(frame::errors::subscript); }
-    };
-    struct State final : frame::AmbientProperties {
-        bool UserMode() const override { return userMode; }
-        frame::FontRef Font() const override { return std::make_shared<frame::Font>(); }
-        std::string DisplayName() const override { return "FileView1"; }
-        bool userMode = true;
-    };
-    struct Watching final : frame::EventSink {
-        explicit Watching(Stage& watched) : stage(watched) {}
-        bool Wants(const frame::EventInfo& event) const override { return !stage.unwanted.contains(std::string(event.name)); }
-        void Raise(const frame::EventInfo& event, frame::EventArguments arguments) override {
-            std::string line(event.name);
-            for (std::size_t i = 0; i < arguments.size(); ++i) {
-                const frame::Variant value = arguments[i].Get();
-                line += (i == 0 ? "(" : ", ") + (value.Type() == frame::VarType::Array ? "array" : value.ToText());
-            }
-            if (!arguments.empty()) line += ")";
-            stage.events_.push_back(line);
-            stage.handlers.Raise(event, arguments);
-        }
-        Stage& stage;
-    };
-    struct StageSite final : frame::Site {
-        explicit StageSite(Stage& watched) : Site(watched.frame_), stage(watched), sink(watched) {}
-        const frame::AmbientProperties& Ambient() const override { return ambient; }
-        frame::Object& Extender() override { return extender; }
-        frame::Object* Parent() override { return nullptr; }
-        frame::Siblings& ParentControls() override { return siblings; }
-        void PropertyChanged(std::string_view key) override { stage.changes.emplace_back(key); }
-        frame::EventSink& Events() override { return sink; }
+    static constexpr const char* name = "FileView1";
 
-        Stage& stage;
-        State ambient;
-        headless::HostObject extender{"FileView1", {}};
-        Nobody siblings;
-        Watching sink;
-    };
-    struct Turning final : frame::MessageLoop {
-        explicit Turning(Stage& watched) : stage(watched) {}
-        void Turn() override {
-            ++stage.turns;
-            if (stage.onTurn) stage.onTurn();
-        }
-        Stage& stage;
-    };
-    struct Icons final : frame::PictureLoader {
-        explicit Icons(Stage& watched) : stage(watched) {}
-        frame::PictureRef LoadPicture(const std::string&) override { return std::make_shared<frame::Picture>(); }
-        frame::PictureRef FileIcon(const std::string& path, int flags) override {
-            constexpr int small = 1;
-            stage.asked.push_back(((flags & small) != 0 ? "S " : "L ") + path);
-            if (!stage.hasIcon(path)) return nullptr;
-            return std::make_shared<frame::Picture>(240.0f, 240.0f, "");
-        }
-        Stage& stage;
-    };
-
-    frame::Services Mixed() {
-        frame::Services services = others.LentServices();
-        services.loop = &loop_;
-        services.pictures = &pictures_;
-        return services;
+    FileView& NewView(const Options& options) {
+        headless::Placing placing{.designTime = options.designTime,
+                                  .saved = options.saved,
+                                  .width = width,
+                                  .height = height,
+                                  .show = options.show,
+                                  .logEvents = false};
+        if (options.heard)
+            placing.onEvent = [this](const std::string&, const frame::EventInfo& event, frame::EventArguments arguments) {
+                Note(event, arguments);
+            };
+        return host.Create<FileView>(name, placing);
     }
-    FileView& NewView() {
-        auto made = std::make_unique<FileView>(frame_);
-        FileView& view = *made;
-        site_->Adopt(std::move(made));
-        return view;
+    void Note(const frame::EventInfo& event, frame::EventArguments arguments) {
+        std::string line(event.name);
+        for (std::size_t i = 0; i < arguments.size(); ++i) {
+            const frame::Variant value = arguments[i].Get();
+            line += (i == 0 ? "(" : ", ") + (value.Type() == frame::VarType::Array ? "array" : value.ToText());
+        }
+        if (!arguments.empty()) line += ")";
+        events_.push_back(line);
+    }
+    void ReadLog() {
+        constexpr std::int32_t smallForm = 1;
+        for (const headless::Log::Entry& entry : host.log.Take()) {
+            const std::string kind = entry.at(0).ToText();
+            if (kind == "changed") changes_.push_back(entry.at(2).ToText());
+            if (kind == "icon") asked_.push_back(((entry.at(2).ToLong() & smallForm) != 0 ? "S " : "L ") + entry.at(1).ToText());
+        }
     }
 
-    std::vector<std::string> events_;
-    Turning loop_{*this};
-    Icons pictures_{*this};
-    frame::Host frame_{Mixed()};
-    std::unique_ptr<StageSite> site_;
+    std::vector<std::string> events_, changes_, asked_;
     FileView& view_;
+
+  public:
+    frame::Handlers& handlers = host.SiteOf(view_)->ApplicationHandlers();  ///< the application's; gone with the control
 };
 
 /// A text of each row: "src | a.txt". Column 0 is the label.

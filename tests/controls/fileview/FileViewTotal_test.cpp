@@ -38,9 +38,9 @@ class Told {
 TEST_F(FileViewTotal, BecomesKnownInIdleTime) {
     Told told;
     view.TotalSizeReady.To<&Told::Ready>(told);
-    stage.others.clock.Advance(20);
+    stage.host.clock.Advance(20);
     EXPECT_FALSE(view.TotalSizeKnown());
-    stage.others.clock.Advance(1'000);
+    stage.host.clock.Advance(1'000);
     EXPECT_TRUE(view.TotalSizeKnown());
     EXPECT_EQ(told.count, 1);
     stage.File("C:\\x\\later", 1);
@@ -58,7 +58,7 @@ TEST_F(FileViewTotal, OfASmallTreeIsKnownAtOnce) {
 TEST_F(FileViewTotal, IsThatOfTheFolderShownWhateverWasMeasuredBefore) {
     stage.File("C:\\y\\a", 3);
     stage.ShowPath("C:\\y");
-    stage.others.clock.Advance(1'000);
+    stage.host.clock.Advance(1'000);
     EXPECT_EQ(view.TotalSize(), Variant(3));
 }
 
@@ -71,7 +71,7 @@ TEST_F(FileViewTotal, StaysKnownWhenTheFolderHasGone) {
 }
 
 TEST_F(FileViewTotal, ARefreshLetsAMeasurementGoOn) {
-    stage.others.clock.Advance(20);
+    stage.host.clock.Advance(20);
     stage.Tick();
     EXPECT_FALSE(view.TotalSizeKnown());
     EXPECT_EQ(view.TotalSize(), Variant(many));
@@ -85,7 +85,7 @@ TEST_F(FileViewTotal, BecomesKnownHoweverOftenTheListIsRefreshed) {
     view.TotalSizeReady.To<&Told::Ready>(told);
     for (int round = 0; round < 8 && told.count == 0; ++round) {
         stage.Tick();
-        stage.others.clock.Advance(20);
+        stage.host.clock.Advance(20);
     }
     EXPECT_EQ(told.count, 1);
 }
@@ -98,7 +98,7 @@ TEST_F(FileViewTotal, ASaveHoldsTheWholeSize) {
 
 TEST_F(FileViewTotal, TheWorkEndsWithTheControl) {
     stage.Destroy();
-    stage.others.clock.Advance(1'000);
+    stage.host.clock.Advance(1'000);
     EXPECT_FALSE(stage.Lives());
 }
 

@@ -225,6 +225,10 @@ TEST_F(DiskFileSystemTest, ALinkIsWhatItLeadsTo) {
     EXPECT_EQ(Rows(folder_.Path()), "sub/|tosub/|loop|toa|tonone");
     EXPECT_TRUE(disk_.FolderExists(folder_ / "tosub"));
     EXPECT_EQ(Rows(folder_ / "tosub"), "a.txt");
+    std::unique_ptr<frame::FolderListing> listing;
+    disk_.List(folder_.Path(), listing).Check();
+    EXPECT_FALSE(listing->IsLink(0));
+    EXPECT_TRUE(listing->IsLink(1));
     EXPECT_EQ(RecordOf("toa").size, 3);
     EXPECT_TRUE(disk_.FileExists(folder_ / "tonone"));
     EXPECT_EQ(RecordOf("tonone").size, 4) << "itself";

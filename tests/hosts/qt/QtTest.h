@@ -41,10 +41,11 @@ inline void Settle() {
 /// A window with a host of its own whose shell and boxes are scripted: no program is started and no box waits.
 class QtTest : public testing::Test {
   protected:
-    explicit QtTest(frame::Dialogs* boxes = nullptr) {
+    explicit QtTest(frame::Dialogs* boxes = nullptr, frame::FileSystem* files = nullptr) {
         frame::Services replaced;
         replaced.shell = &shell;
         replaced.dialogs = boxes ? boxes : &dialogs;
+        replaced.files = files;
         host = qt::Host::make(replaced);
         window = new QWidget;
         window->setObjectName("frmMain");

@@ -16,6 +16,7 @@
 #include "hosts/qt/Form.h"
 #include "hosts/qt/Host.h"
 #include "hosts/qt/Link.h"
+#include "hosts/qt/Services.h"
 
 /// The host for Qt with the clock, the boxes, the shell and the log of the headless host, for tests that run on both.
 namespace tessel::qt::test {
@@ -84,11 +85,32 @@ class TestSite {
     frame::Handlers& handlers_;
 };
 
+/// The loop of the host for Qt, which tells of each turn as the headless one does.
+class ToldLoop final : public frame::MessageLoop {
+  public:
+    ToldLoop(headless::Log& log, std::function<void()> settle) : log_(log), real_(std::move(settle)) {}
+    void Turn() override {
+        log_.Add({"yield"});
+        if (onTurn) onTurn();
+        real_.Turn();
+    }
+    void WantTurn() override { real_.WantTurn(); }
+
+    std::function<void()> onTurn;  ///< what comes in meanwhile, before what the window system has
+
+  private:
+    headless::Log& log_;
+    EventLoop real_;
+};
+
 class QtTestHost {
     headless::HeadlessHost lent_;
 
   public:
-    QtTestHost() { form_->show(); }
+    /// `otherFiles` takes the place of the memory disk, where there is one.
+    explicit QtTestHost(frame::FileSystem* otherFiles = nullptr) : lent_(otherFiles) { form_->show(); }
+    QtTestHost(const QtTestHost&) = delete;
+    QtTestHost& operator=(const QtTestHost&) = delete;
     ~QtTestHost() {
         form_.reset();
         QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
@@ -147,13 +169,16 @@ class QtTestHost {
     headless::ScriptedShell& shell = lent_.shell;
     headless::ScriptedRandom& random = lent_.random;
     headless::FixedMetrics& metrics = lent_.metrics;
+    headless::ScriptedPictures& pictures = lent_.pictures;
+    headless::MemoryDisk& files = lent_.files;
     headless::ErrorList& errors = lent_.errors;
+    ToldLoop loop{log, [this] { Frame().Settle(); }};
 
   private:
     /// All services of the headless host but those that make the screen.
     frame::Services Scripted() {
         frame::Services services = lent_.LentServices();
-        services.loop = nullptr;
+        services.loop = &loop;
         services.peers = nullptr;
         services.focus = nullptr;
         return services;

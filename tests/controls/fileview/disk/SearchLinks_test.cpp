@@ -14,7 +14,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-class FileViewOnDisk : public testing::Test {
+class SearchLinks : public testing::Test {
   protected:
     /// Folder and name of each row, below the folder of the test: "/sub/a.txt | /b.txt".
     std::string Rows() const {
@@ -35,7 +35,7 @@ class FileViewOnDisk : public testing::Test {
     FileView& view_{host_.Create<FileView>("FileView1")};
 };
 
-TEST_F(FileViewOnDisk, ASearchDoesNotFollowLinksToFolders) {
+TEST_F(SearchLinks, ASearchDoesNotFollowLinksToFolders) {
     folder_.Make("sub");
     folder_.Make("other");
     folder_.Write("a.txt", "a");
@@ -48,7 +48,7 @@ TEST_F(FileViewOnDisk, ASearchDoesNotFollowLinksToFolders) {
     EXPECT_EQ(view_.TotalSize(), frame::Variant(3));
 }
 
-TEST_F(FileViewOnDisk, ASearchBeginsInALinkAndFindsLinksToFiles) {
+TEST_F(SearchLinks, ASearchBeginsInALinkAndFindsLinksToFiles) {
     folder_.Make("sub");
     folder_.Write("sub/b.txt", "b");
     fs::create_symlink("b.txt", folder_ / "sub/c.txt");
@@ -58,7 +58,7 @@ TEST_F(FileViewOnDisk, ASearchBeginsInALinkAndFindsLinksToFiles) {
 }
 
 /// The entry itself counts as any other sub-folder.
-TEST_F(FileViewOnDisk, ALinkToAFolderThatMatchesHasItsTurnOfTheMessageLoop) {
+TEST_F(SearchLinks, ALinkToAFolderThatMatchesHasItsTurnOfTheMessageLoop) {
     folder_.Make("sub");
     fs::create_symlink("..", folder_ / "sub/up");
     view_.Search("none", folder_.Path(), true);
@@ -68,7 +68,7 @@ TEST_F(FileViewOnDisk, ALinkToAFolderThatMatchesHasItsTurnOfTheMessageLoop) {
     EXPECT_EQ(Turns(), without + 1);
 }
 
-TEST_F(FileViewOnDisk, AListingShowsALinkToAFolderAsAFolder) {
+TEST_F(SearchLinks, AListingShowsALinkToAFolderAsAFolder) {
     folder_.Make("sub");
     fs::create_symlink("sub", folder_ / "tosub");
     view_.SetPathRoot(folder_.Path());
