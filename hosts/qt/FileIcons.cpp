@@ -15,45 +15,44 @@ namespace tessel::qt {
 
 namespace {
 
-constexpr int smallForm = 1, openForm = 2;
+/// An icon by the first of these names that the theme has, otherwise one of the widget style.
+struct Kind {
+    QString themed;
+    QStyle::StandardPixmap otherwise = QStyle::SP_FileIcon;
 
-QIcon Themed(std::initializer_list<QString> names, QStyle::StandardPixmap otherwise) {
-    for (const QString& name : names)
-        if (QIcon::hasThemeIcon(name)) return QIcon::fromTheme(name);
-    return QApplication::style()->standardIcon(otherwise);
-}
+    Kind(std::initializer_list<QString> names, QStyle::StandardPixmap standard) : otherwise(standard) {
+        for (const QString& name : names)
+            if (themed.isEmpty() && QIcon::hasThemeIcon(name)) themed = name;
+    }
+    QIcon Icon() const { return themed.isEmpty() ? QApplication::style()->standardIcon(otherwise) : QIcon::fromTheme(themed); }
+};
 
-QIcon DriveIcon(const QStorageInfo& drive) {
+Kind KindOfDrive(const QStorageInfo& drive) {
     const QByteArray type = drive.fileSystemType();
-    if (type == "iso9660" || type == "udf") return Themed({"media-optical", "drive-optical"}, QStyle::SP_DriveCDIcon);
+    if (type == "iso9660" || type == "udf") return {{"media-optical", "drive-optical"}, QStyle::SP_DriveCDIcon};
     if (type.startsWith("nfs") || type == "cifs" || type == "smb3" || type == "fuse.sshfs")
-        return Themed({"folder-remote", "network-server"}, QStyle::SP_DriveNetIcon);
+        return {{"folder-remote", "network-server"}, QStyle::SP_DriveNetIcon};
     if (drive.rootPath().startsWith("/media/") || drive.rootPath().startsWith("/run/media/"))
-        return Themed({"drive-removable-media", "drive-harddisk"}, QStyle::SP_DriveHDIcon);
-    return Themed({"drive-harddisk"}, QStyle::SP_DriveHDIcon);
+        return {{"drive-removable-media", "drive-harddisk"}, QStyle::SP_DriveHDIcon};
+    return {{"drive-harddisk"}, QStyle::SP_DriveHDIcon};
 }
 
-QIcon IconOf(const QFileInfo& file, bool open) {
+Kind KindOf(const QFileInfo& file, bool open) {
     if (file.isDir()) {
         // Only the spelling with a separator at its end names a drive.
         if (file.filePath().endsWith('/')) {
             const QStorageInfo drive(file.filePath());
             const QString root = drive.rootPath();
-            if (file.filePath() == (root.endsWith('/') ? root : root + '/')) return DriveIcon(drive);
+            if (file.filePath() == (root.endsWith('/') ? root : root + '/')) return KindOfDrive(drive);
         }
-        return open ? Themed({"folder-open", "folder"}, QStyle::SP_DirOpenIcon) : Themed({"folder"}, QStyle::SP_DirIcon);
+        if (open) return {{"folder-open", "folder"}, QStyle::SP_DirOpenIcon};
+        return {{"folder"}, QStyle::SP_DirIcon};
     }
     const QMimeType type = QMimeDatabase().mimeTypeForFile(file, QMimeDatabase::MatchExtension);
-    return Themed({type.iconName(), type.genericIconName(), "text-x-generic"}, QStyle::SP_FileIcon);
+    return {{type.iconName(), type.genericIconName(), "text-x-generic"}, QStyle::SP_FileIcon};
 }
 
-}  // namespace
-
-frame::PictureRef FileIcon(const QString& path, int flags) {
-    const QFileInfo file(path);
-    if (!file.exists() && !file.isSymLink()) return nullptr;
-    const QIcon icon = IconOf(file, (flags & openForm) != 0);
-    const int side = flags & smallForm ? 16 : 32;
+frame::PictureRef PictureOf(const QIcon& icon, int side) {
     std::vector<frame::PixelPlane> planes;
     for (const int scale : {1, 2}) {
         const QPixmap shown = icon.pixmap(QSize(side, side), scale);
@@ -67,7 +66,24 @@ frame::PictureRef FileIcon(const QString& path, int flags) {
         painter.end();
         planes.push_back(PlaneOf(image, scale));
     }
-    return std::make_shared<frame::Picture>(std::move(planes), FromQt(path));
+    return std::make_shared<frame::Picture>(std::move(planes), "");
+}
+
+}  // namespace
+
+frame::PictureRef FileIcons::Of(const QString& path, int flags) {
+    constexpr int smallForm = 1, openForm = 2, smallSide = 16, largeSide = 32;
+    const QFileInfo file(path);
+    if (!file.exists() && !file.isSymLink()) return nullptr;
+    if (const QString look = QIcon::themeName() + '/' + QApplication::style()->name(); look != look_) {
+        look_ = look;
+        known_.clear();
+    }
+    const Kind kind = KindOf(file, (flags & openForm) != 0);
+    const int side = flags & smallForm ? smallSide : largeSide;
+    const auto [known, isNew] = known_.try_emplace({kind.themed, kind.otherwise, side});
+    if (isNew) known->second = PictureOf(kind.Icon(), side);
+    return known->second;
 }
 
 }  // namespace tessel::qt

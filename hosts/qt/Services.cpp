@@ -19,7 +19,6 @@
 #include "frame/Dates.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/Cursors.h"
-#include "hosts/qt/FileIcons.h"
 #include "hosts/qt/TextLayout.h"
 #include "hosts/qt/WidgetPeer.h"
 
@@ -214,7 +213,7 @@ frame::PictureRef ImageLoader::LoadPicture(const std::string& fileName) {
     return FromQt(image, name);
 }
 
-frame::PictureRef ImageLoader::FileIcon(const std::string& path, int flags) { return qt::FileIcon(ToQt(path), flags); }
+frame::PictureRef ImageLoader::FileIcon(const std::string& path, int flags) { return icons_.Of(ToQt(path), flags); }
 
 frame::TextSize FontMetrics::Measure(const frame::Font& font, std::string_view text, std::optional<float> wrapWidth) {
     const QSizeF size =

@@ -12,6 +12,7 @@
 
 #include "frame/host.h"
 #include "hosts/posix/Opener.h"
+#include "hosts/qt/FileIcons.h"
 
 /// The services of the Qt host.
 namespace tessel::qt {
@@ -96,6 +97,9 @@ class ImageLoader final : public frame::PictureLoader {
   public:
     frame::PictureRef LoadPicture(const std::string& fileName) override;
     frame::PictureRef FileIcon(const std::string& path, int flags) override;
+
+  private:
+    FileIcons icons_;
 };
 
 /// Measures as the widgets of this host paint.

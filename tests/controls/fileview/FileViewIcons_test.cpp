@@ -86,7 +86,7 @@ TEST_F(FileViewIcons, EveryFileWithoutExtensionAddsAnImageWithoutKey) {
     stage.File("C:\\x\\README");
     List("C:\\x");
     EXPECT_EQ(SmallIcons(), " | ");
-    EXPECT_THAT(stage.asked, ElementsAre("S C:\\x\\LICENSE", "L C:\\x\\LICENSE", "S C:\\x\\README", "L C:\\x\\README"));
+    EXPECT_THAT(stage.Asked(), ElementsAre("S C:\\x\\LICENSE", "L C:\\x\\LICENSE", "S C:\\x\\README", "L C:\\x\\README"));
     EXPECT_EQ(view.Image16.ListImages.Count(), 7);
     EXPECT_EQ(view.Image32.ListImages.Count(), 5);
 }

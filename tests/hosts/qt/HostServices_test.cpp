@@ -232,8 +232,9 @@ TEST_F(PicturesTest, FilesAndFoldersHaveIconsInTwoSizesAndTwoScales) {
     QFile words(folder.filePath("words.txt"));
     ASSERT_TRUE(words.open(QIODevice::WriteOnly));
     words.close();
+    FileIcons icons;
     for (const QString& path : {folder.path(), folder.filePath("words.txt"), QString("/")}) {
-        const frame::PictureRef small = FileIcon(path, 0x6605), large = FileIcon(path, 0x6604);
+        const frame::PictureRef small = icons.Of(path, 0x6605), large = icons.Of(path, 0x6604);
         ASSERT_TRUE(small && large) << path.toStdString();
         EXPECT_EQ(small->Width(), 240);
         EXPECT_EQ(large->Width(), 480);
@@ -241,7 +242,17 @@ TEST_F(PicturesTest, FilesAndFoldersHaveIconsInTwoSizesAndTwoScales) {
         EXPECT_EQ(large->Plane(2)->height, 64);
         EXPECT_THAT(large->Plane(1)->pixels, testing::Contains(testing::Ge(0x01000000u))) << "an icon that shows nothing";
     }
-    EXPECT_EQ(FileIcon(folder.filePath("none.txt"), 0x6605), nullptr);
+    EXPECT_EQ(icons.Of(folder.filePath("none.txt"), 0x6605), nullptr);
+}
+
+TEST_F(PicturesTest, WhatLooksTheSameIsTheSamePicture) {
+    for (const char* name : {"a.txt", "b.txt", "README", "LICENSE"})
+        EXPECT_TRUE(QFile(folder.filePath(name)).open(QIODevice::WriteOnly));
+    FileIcons icons;
+    const auto icon = [&](const char* name, int flags) { return icons.Of(folder.filePath(name), flags); };
+    EXPECT_EQ(icon("a.txt", 0x6605), icon("b.txt", 0x6605));
+    EXPECT_NE(icon("a.txt", 0x6605), icon("a.txt", 0x6604));
+    EXPECT_NE(icon(".", 0x6605), icon("a.txt", 0x6605));
 }
 
 // Colours
