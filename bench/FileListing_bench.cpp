@@ -100,10 +100,22 @@ class Stage {
     struct IdleLoop final : frame::MessageLoop {
         void Turn() override {}
     };
+    /// A shell that keeps its icons, as those of desktops do.
+    struct KeptIcons final : frame::PictureLoader {
+        frame::PictureRef LoadPicture(const std::string&) override { return nullptr; }
+        frame::PictureRef FileIcon(const std::string&, int flags) override { return flags & 1 ? small : large; }
+        static frame::PictureRef Square(int side) {
+            const auto pixels = static_cast<std::size_t>(side) * static_cast<std::size_t>(side);
+            return std::make_shared<frame::Picture>(
+                std::vector<frame::PixelPlane>{{1, side, side, std::vector<std::uint32_t>(pixels, 0xFFFF0000)}}, "");
+        }
+        frame::PictureRef small = Square(16), large = Square(32);
+    };
 
     frame::Services Mixed() {
         frame::Services services = headless_.LentServices();
         services.loop = &loop_;
+        services.pictures = &icons_;
         return services;
     }
     controls::FileView& NewView() {
@@ -116,6 +128,7 @@ class Stage {
     posix::DiskFileSystem disk_;
     headless::HeadlessHost headless_{&disk_};
     IdleLoop loop_;
+    KeptIcons icons_;
     frame::Handlers handlers_;
     frame::Host frame_{Mixed()};
     std::unique_ptr<Place> site_ = std::make_unique<Place>(*this);
