@@ -4,6 +4,7 @@
 #include <array>
 
 #include "controls/fileview/FileView.h"
+#include "controls/folderview/FolderView.h"
 #include "controls/link/Link.h"
 #include "frame/Text.h"
 
@@ -15,7 +16,7 @@ template <class C>
 constexpr frame::ControlClass classOf{
     &C::table, [](frame::Host& host) -> std::unique_ptr<frame::Control> { return std::make_unique<C>(host); }};
 
-constexpr std::array classes = {classOf<FileView>, classOf<Link>};
+constexpr std::array classes = {classOf<FileView>, classOf<FolderView>, classOf<Link>};
 
 }  // namespace
 

@@ -2,7 +2,7 @@
 
 #include <array>
 
-#include "controls/fileview/DesignImages.h"
+#include "fileservices/DesignImages.h"
 #include "fileservices/PathHelpers.h"
 #include "fileservices/SpecialFolders.h"
 #include "frame/ResumeNext.h"
@@ -52,7 +52,7 @@ FileView::FileView(frame::Host& host) : Control(host) {
 void FileView::DesignPictures() {
     constexpr OLE_COLOR mask = 0xC0C0C0;
     constexpr int largeSide = 32, smallSide = 16;
-    namespace designed = designimages;
+    namespace designed = fileservices::designimages;
     const auto add = [](ImageList& images, std::string_view key, int side) {
         images.ListImages.Add({}, std::string(key), designed::Draw(key, side));
     };
@@ -252,7 +252,8 @@ void FileView::SortByColumn(std::int32_t column) {
     });
     const bool again = target == ListFiles.SortKey() + 1;
     const Order order = again && ListFiles.SortOrder() == Order::Ascending ? Order::Descending : Order::Ascending;
-    const std::string_view picture = order == Order::Ascending ? designimages::sortDown : designimages::sortUp;
+    const std::string_view picture =
+        order == Order::Ascending ? fileservices::designimages::sortDown : fileservices::designimages::sortUp;
     next([&] { return headers.Item(column).SetIcon(picture); });
     if (!again) next([&] { ListFiles.SetSortKey(target - 1); });
     next([&] { ListFiles.SetSortOrder(order); });

@@ -1,7 +1,7 @@
-#include "controls/fileview/DesignImages.h"
 #include "controls/fileview/FileView.h"
 #include "controls/fileview/FilterMatch.h"
 #include "fileservices/CommonFile.h"
+#include "fileservices/DesignImages.h"
 #include "fileservices/FileSys.h"
 #include "fileservices/FileSystemObject.h"
 #include "fileservices/PathHelpers.h"
@@ -121,8 +121,8 @@ void FileView::AddUnavailableFolder(const std::string& path) {
     child::ListRows& rows = ListFiles.Rows();
     const RowId row = rows.Add(path + " (Unavailable)");
     ResumeNext next;
-    next([&] { return rows.SetIconKey(row, child::IconSize::Large, designimages::folderUnavailable); });
-    next([&] { return rows.SetIconKey(row, child::IconSize::Small, designimages::folderUnavailable); });
+    next([&] { return rows.SetIconKey(row, child::IconSize::Large, fileservices::designimages::folderUnavailable); });
+    next([&] { return rows.SetIconKey(row, child::IconSize::Small, fileservices::designimages::folderUnavailable); });
     rows.SetText(row, subItem::sortName, " " + path);
 }
 

@@ -258,8 +258,9 @@ bool LoadsWhatASaveLeavesOut(const frame::BagKey& key) {
 
 /// The properties that take a value only where there is something to choose it from.
 bool ChoosesFromWhatIsThere(const std::string& path) {
-    static const std::set<std::string, std::less<>> names = {"Icons",    "SmallIcons", "ColumnHeaderIcons", "SelectedItem",
-                                                             "TopIndex", "ImageWidth", "ImageHeight"};
+    static const std::set<std::string, std::less<>> names = {"Icons",     "SmallIcons",   "ColumnHeaderIcons",
+                                                             "ImageList", "SelectedItem", "DropHighlight",
+                                                             "TopIndex",  "ImageWidth",   "ImageHeight"};
     return names.contains(std::string_view(path).substr(path.rfind('.') + 1));
 }
 

@@ -1,4 +1,4 @@
-#include "controls/fileview/DesignImages.h"
+#include "fileservices/DesignImages.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -7,7 +7,7 @@
 #include <utility>
 #include <vector>
 
-namespace tessel::controls::designimages {
+namespace tessel::fileservices::designimages {
 
 namespace {
 
@@ -16,7 +16,7 @@ constexpr int grid = 16;  // what is drawn is measured in sixteenths of the side
 // 0xAABBGGRR
 constexpr std::uint32_t paleYellow = 0xFF9CE4FF, yellow = 0xFF5CC8F8, brown = 0xFF1E7AA8;
 constexpr std::uint32_t paleGrey = 0xFFEEEEEE, grey = 0xFFC8C8C8, darkGrey = 0xFF707070;
-constexpr std::uint32_t red = 0xFF2828D0, green = 0xFF30A030;
+constexpr std::uint32_t red = 0xFF2828D0, green = 0xFF30A030, blue = 0xFFB06820;
 
 class Sketch {
   public:
@@ -63,6 +63,13 @@ void DrawFolder(Sketch& sketch, std::uint32_t body, std::uint32_t flap, std::uin
     sketch.Framed(1, 6, 14, 8, body, outline);
 }
 
+void DrawComputer(Sketch& sketch) {
+    sketch.Framed(1, 1, 14, 10, grey, darkGrey);
+    sketch.Box(3, 3, 10, 6, blue);
+    sketch.Box(6, 11, 4, 2, darkGrey);
+    sketch.Framed(3, 13, 10, 2, grey, darkGrey);
+}
+
 void DrawDrive(Sketch& sketch) {
     sketch.Framed(1, 5, 14, 8, grey, darkGrey);
     sketch.Box(3, 7, 10, 1, paleGrey);
@@ -81,6 +88,12 @@ frame::PictureRef Draw(std::string_view name, int side) {
     } else if (name == driveUnavailable) {
         DrawDrive(sketch);
         sketch.Cross(8, 8, 7, red);
+    } else if (name == myComputer) {
+        DrawComputer(sketch);
+    } else if (name == myFolders) {
+        DrawFolder(sketch, yellow, paleYellow, brown);
+        sketch.Framed(7, 8, 7, 5, paleGrey, darkGrey);
+        sketch.Box(9, 10, 3, 1, blue);
     } else if (name == sortUp) {
         sketch.Triangle(3, 6, 4, Sketch::Points::Up, darkGrey);
     } else if (name == sortDown) {
@@ -89,4 +102,4 @@ frame::PictureRef Draw(std::string_view name, int side) {
     return std::move(sketch).Picture();
 }
 
-}  // namespace tessel::controls::designimages
+}  // namespace tessel::fileservices::designimages
