@@ -8,6 +8,7 @@
 #include <QStackedWidget>
 #include <QStatusBar>
 
+#include "apps/gallery/BrowserPage.h"
 #include "apps/gallery/FilesPage.h"
 #include "apps/gallery/LinksPage.h"
 #include "hosts/qt/Host.h"
@@ -35,6 +36,7 @@ Window::Window(QWidget* parent) : QMainWindow(parent), list_(new QListWidget), s
     makeMenus();
     addPage(new LinksPage);
     addPage(new FilesPage);
+    addPage(new BrowserPage);
     choose(0);
 }
 

@@ -13,6 +13,7 @@
 #include "hosts/headless/HeadlessHost.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/FileView.h"
+#include "hosts/qt/FolderView.h"
 #include "hosts/qt/Form.h"
 #include "hosts/qt/Host.h"
 #include "hosts/qt/Link.h"
@@ -195,6 +196,7 @@ class QtTestHost {
     }
     ControlWidget& Make(const frame::ControlClass& controlClass, const headless::Placing& placing) {
         if (controlClass.table->name == "FileView") return Placed<FileView>(placing);
+        if (controlClass.table->name == "FolderView") return Placed<FolderView>(placing);
         if (controlClass.table->name == "Link") return Placed<Link>(placing);
         throw frame::ControlError(frame::errors::notSupported);
     }
