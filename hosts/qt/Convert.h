@@ -49,6 +49,7 @@ frame::Variant FromQt(const QVariant& value);
 
 /// Whole pixels of a length or a place in twips.
 int Pixels(float twips);
+inline double PixelsExactly(float twips) { return static_cast<double>(twips) / frame::twipsPerPixel; }
 inline float Twips(double pixels) { return static_cast<float>(pixels * frame::twipsPerPixel); }
 /// The rectangle between rounded edges: neighbours in twips stay neighbours in pixels.
 QRect PixelRect(float left, float top, float width, float height);

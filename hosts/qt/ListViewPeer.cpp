@@ -4,12 +4,6 @@
 
 namespace tessel::qt {
 
-namespace {
-
-qreal PixelsExactly(float twips) { return static_cast<qreal>(twips) / frame::twipsPerPixel; }
-
-}  // namespace
-
 ListViewPeer::ListViewPeer(child::ListView& list) : ListViewPeer(list, new ListWidget(list)) {}
 
 ListViewPeer::ListViewPeer(child::ListView& list, ListWidget* widget) : WidgetPeer(list, widget), shown_(widget) {}

@@ -1,15 +1,12 @@
 #include <QApplication>
-#include <QHelpEvent>
 #include <QScrollBar>
 #include <QStyle>
-#include <QToolTip>
 #include <algorithm>
 
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/ListWidget.h"
 
-/// What the user does with a list: the mouse and the keys are reported first, then what they mean to the list. Any report may end
-/// the list.
+/// What the user does with a list.
 namespace tessel::qt {
 
 using child::ListSelectConstants;
@@ -38,35 +35,20 @@ std::vector<RowRange> Less(const std::vector<RowRange>& from, const std::vector<
 
 }  // namespace
 
-bool ListWidget::Settle() {
-    if (list_) list_->Host().Flush();
-    return list_ != nullptr;
-}
-
-QMouseEvent ListWidget::Inside(const QMouseEvent& event) const {
-    const QPointF moved = event.position() + InsideOffset();
-    return {event.type(), moved, event.scenePosition(), event.globalPosition(), event.button(), event.buttons(), event.modifiers()};
-}
-
 // The mouse.
 
 void ListWidget::mousePressEvent(QMouseEvent* event) {
-    if (!Settle()) return;
-    editTimer_.stop();
     hoverTimer_.stop();
     pressedSelected_.reset();
-    clickEdits_.reset();
     pressedBeside_.reset();
-    pressedAt_ = event->position().toPoint();
-    pressedWith_ = event->modifiers();
-    const bool bringsFocus = std::exchange(focusedByMouse_, false);
-    pointer_.Press(Inside(*event));
-    if (event->button() != Qt::LeftButton || !Settle()) return;
+    RowView::mousePressEvent(event);
+}
+
+void ListWidget::PressAt(const QMouseEvent& event) {
     if (const auto row = HitRow(pressedAt_))
-        PressRow(*row, *event);
+        PressRow(*row, event);
     else
-        PressBeside(*event);
-    if (bringsFocus) clickEdits_.reset();  // a click that comes from elsewhere only comes here
+        PressBeside(event);
 }
 
 void ListWidget::PressRow(Position row, const QMouseEvent& event) {
@@ -79,7 +61,8 @@ void ListWidget::PressRow(Position row, const QMouseEvent& event) {
     const QPoint at = ToContents(pressedAt_);
     const QRect text(label.text.left(), label.text.top(),
                      std::min(label.text.width(), fontMetrics().horizontalAdvance(LabelText(row))), label.text.height());
-    if (isOnly && (IsLargeIcons() ? label.mark : text).contains(at)) clickEdits_ = list_->Rows().Ref(id);
+    const bool isLabel = (IsLargeIcons() ? label.mark : text).contains(at);
+    if (isOnly && isLabel && list_->LabelEdit() == child::ListLabelEditConstants::Automatic) EditByClick(row);
 }
 
 void ListWidget::PressBeside(const QMouseEvent& event) {
@@ -87,79 +70,27 @@ void ListWidget::PressBeside(const QMouseEvent& event) {
     if ((event.modifiers() & selecting) == 0) list_->SelectNoneInput();
 }
 
-void ListWidget::mouseMoveEvent(QMouseEvent* event) {
-    if (!Settle()) return;
-    pointerAt_ = event->position().toPoint();
-    pointer_.Move(Inside(*event));
-    if (!Settle()) return;
-    Hover(pointerAt_);
-    const bool isFar = (pointerAt_ - pressedAt_).manhattanLength() >= QApplication::startDragDistance();
-    if (isFar && (event->buttons() & Qt::LeftButton)) clickEdits_.reset();
+void ListWidget::DragTo(bool isFar) {
     if (band_)
         MoveBand();
-    else if (isFar && pressedBeside_ && (event->buttons() & Qt::LeftButton) && list_->MultiSelect())
+    else if (isFar && pressedBeside_ && list_->MultiSelect())
         BeginBand();
 }
 
-void ListWidget::mouseReleaseEvent(QMouseEvent* event) {
-    if (!Settle()) return;
-    const bool clicks = pointer_.ReleaseAlone(Inside(*event));
-    if (event->button() == Qt::LeftButton && Settle()) {
-        const auto row = HitRow(event->position().toPoint());
-        const auto waiting = std::exchange(pressedSelected_, std::nullopt);
-        EndBand();
-        pressedBeside_.reset();
-        if (waiting && waiting == row) list_->ItemClickInput(IndexOf(*row), ShiftOf(pressedWith_));
-    }
-    if (clicks) pointer_.Click();
-    if (!Settle() || !clicks || !clickEdits_ || !list_->Rows().Lives(*clickEdits_)) return;
-    OpenEditSoon(list_->Rows().PositionOf(clickEdits_->row));
-}
-
-void ListWidget::mouseDoubleClickEvent(QMouseEvent* event) {
-    if (!Settle()) return;
-    editTimer_.stop();
-    clickEdits_.reset();
-    pointer_.DoubleClick(Inside(*event));
-}
-
-void ListWidget::OpenEditSoon(Position row) {
-    if (list_->LabelEdit() != child::ListLabelEditConstants::Automatic) return;
-    clickEdits_ = list_->Rows().Ref(list_->Rows().At(row));
-    editTimer_.start(QApplication::doubleClickInterval(), this);
+void ListWidget::ReleaseAt(const QMouseEvent& event) {
+    const auto row = HitRow(event.position().toPoint());
+    const auto waiting = std::exchange(pressedSelected_, std::nullopt);
+    EndBand();
+    pressedBeside_.reset();
+    if (waiting && waiting == row) list_->ItemClickInput(IndexOf(*row), ShiftOf(pressedWith_));
 }
 
 void ListWidget::Hover(QPoint at) {
-    const bool wanted = list_->HotTracking() || list_->HoverSelection();
-    const auto row = wanted && viewport()->rect().contains(at) ? HitRow(at) : std::nullopt;
-    if (row == hot_) return;
-    for (const auto changed : {hot_, row})
-        if (changed) UpdateRows(*changed, 1);
-    hot_ = row;
+    const auto before = hot_;
+    RowView::Hover(at);
+    if (hot_ == before) return;
     hoverTimer_.stop();
-    if (row && list_->HoverSelection()) hoverTimer_.start(style()->styleHint(QStyle::SH_ToolTip_WakeUpDelay), this);
-}
-
-bool ListWidget::viewportEvent(QEvent* event) {
-    switch (event->type()) {
-        case QEvent::Leave:
-            if (list_) Hover({-1, -1});
-            pointer_.Leave();
-            break;
-        case QEvent::ToolTip: {
-            const auto& help = static_cast<const QHelpEvent&>(*event);
-            const QString full = toolTip().isEmpty() ? FullTextAt(help.pos()) : toolTip();
-            QToolTip::showText(help.globalPos(), full, viewport());
-            return true;
-        }
-        case QEvent::HoverEnter:
-        case QEvent::HoverMove:
-        case QEvent::HoverLeave:
-            return QAbstractScrollArea::viewportEvent(event);
-        default:
-            break;
-    }
-    return QAbstractItemView::viewportEvent(event);
+    if (hot_ && list_->HoverSelection()) hoverTimer_.start(style()->styleHint(QStyle::SH_ToolTip_WakeUpDelay), this);
 }
 
 // The rubber band.
@@ -238,87 +169,18 @@ void ListWidget::timerEvent(QTimerEvent* event) {
         hoverTimer_.stop();
         if (!Settle() || !hot_ || *hot_ >= list_->Rows().Count() || QApplication::mouseButtons() != Qt::NoButton) return;
         if (list_->HoverSelection()) list_->SelectInput(IndexOf(*hot_), ListSelectConstants::Only);
-    } else if (id == editTimer_.timerId()) {
-        editTimer_.stop();
-        const auto row = std::exchange(clickEdits_, std::nullopt);
-        if (!Settle() || !row || !list_->Rows().Lives(*row) || !list_->Rows().Selected(row->row)) return;
-        list_->EditInput(IndexOf(list_->Rows().PositionOf(row->row)));
-    } else if (id == typeTimer_.timerId()) {
-        typeTimer_.stop();
-        typed_.clear();
     } else {
-        QAbstractItemView::timerEvent(event);
+        RowView::timerEvent(event);
     }
-}
-
-// Drops.
-
-void ListWidget::dragEnterEvent(QDragEnterEvent* event) {
-    if (Settle()) drops_.Enter(*event, event->position() + InsideOffset());
-}
-
-void ListWidget::dragMoveEvent(QDragMoveEvent* event) {
-    if (Settle()) drops_.Over(*event, event->position() + InsideOffset());
-}
-
-void ListWidget::dragLeaveEvent(QDragLeaveEvent*) {
-    if (Settle()) drops_.Leave();
-}
-
-void ListWidget::dropEvent(QDropEvent* event) {
-    if (Settle()) drops_.Drop(*event, event->position() + InsideOffset());
 }
 
 // The keyboard.
 
-void ListWidget::keyPressEvent(QKeyEvent* event) {
-    if (!Settle()) return;
-    editTimer_.stop();
-    const bool wasEditing = editor_ != nullptr;
-    keys_->Press(*event);
-    event->accept();
-    if (!Settle() || (editor_ && !wasEditing)) return;
-    if (MoveByKey(*event) || SelectByKey(*event)) return;
-    const bool types = !event->text().isEmpty() && event->text().front().isPrint() &&
-                       !(event->modifiers() & (Qt::ControlModifier | Qt::AltModifier | Qt::MetaModifier));
-    if (types)
-        TypeAhead(event->text());
-    else
-        event->ignore();
-}
-
 bool ListWidget::MoveByKey(const QKeyEvent& event) {
     using Step = ListLayout::Step;
-    const bool mirrored = isRightToLeft();
-    Step step = Step::First;
-    switch (event.key()) {
-        case Qt::Key_Up:
-            step = Step::Up;
-            break;
-        case Qt::Key_Down:
-            step = Step::Down;
-            break;
-        case Qt::Key_Left:
-            step = mirrored ? Step::Right : Step::Left;
-            break;
-        case Qt::Key_Right:
-            step = mirrored ? Step::Left : Step::Right;
-            break;
-        case Qt::Key_PageUp:
-            step = Step::PageUp;
-            break;
-        case Qt::Key_PageDown:
-            step = Step::PageDown;
-            break;
-        case Qt::Key_Home:
-            step = Step::First;
-            break;
-        case Qt::Key_End:
-            step = Step::Last;
-            break;
-        default:
-            return false;
-    }
+    const auto wanted = StepOf(event);
+    if (!wanted) return false;
+    const Step step = *wanted;
     const bool sideways = step == Step::Left || step == Step::Right;
     if (IsReport() && sideways) {  // there is no row at the side
         QScrollBar& bar = *horizontalScrollBar();
@@ -332,19 +194,14 @@ bool ListWidget::MoveByKey(const QKeyEvent& event) {
     return true;
 }
 
-void ListWidget::SelectByKeyboard(Position row, Qt::KeyboardModifiers modifiers) {
+void ListWidget::ReportSelection(Position row, Qt::KeyboardModifiers modifiers) {
     const bool extends = modifiers & Qt::ShiftModifier, keeps = modifiers & Qt::ControlModifier;
-    const child::RowRef target = list_->Rows().Ref(list_->Rows().At(row));
     if (!list_->MultiSelect() || (!extends && !keeps))
         list_->SelectInput(IndexOf(row), ListSelectConstants::Only);
     else if (extends)
         list_->SelectInput(IndexOf(row), keeps ? ListSelectConstants::AddRange : ListSelectConstants::Range);
     else
         list_->FocusInput(IndexOf(row));
-    if (!Settle() || !list_->Rows().Lives(target)) return;
-    const Position before = FirstVisible();
-    MakeVisible(list_->Rows().PositionOf(target.row));
-    if (FirstVisible() != before) list_->ScrollInput(IndexOf(FirstVisible()));
 }
 
 bool ListWidget::SelectByKey(const QKeyEvent& event) {
@@ -364,33 +221,12 @@ bool ListWidget::SelectByKey(const QKeyEvent& event) {
     return true;
 }
 
-void ListWidget::TypeAhead(const QString& typed) {
-    const Position count = list_->Rows().Count();
-    if (count == 0) return;
-    typeTimer_.start(QApplication::keyboardInputInterval(), this);
-    typed_ += typed;
-    // The same letter again and again goes from row to row.
-    const bool isOneLetter = typed_ == QString(typed_.size(), typed_.front());
-    const QString wanted = isOneLetter ? typed_.left(1) : typed_;
-    const auto focus = FocusPosition();
-    const Position first = !focus ? 0 : isOneLetter ? (*focus + 1) % count : *focus;
+std::optional<ListWidget::Position> ListWidget::FindFrom(Position first, const QString& text) const {
     using Where = child::ListFindWhereConstants;
     using How = child::ListFindHowConstants;
-    auto found = list_->FindItem(FromQt(wanted), Where::Text, IndexOf(first), How::Partial);
-    if (!found && first > 0) found = list_->FindItem(FromQt(wanted), Where::Text, 1, How::Partial);
-    if (found) SelectByKeyboard(static_cast<Position>(found->Index() - 1), Qt::NoModifier);
-}
-
-void ListWidget::focusInEvent(QFocusEvent* event) {
-    QAbstractScrollArea::focusInEvent(event);
-    focusedByMouse_ = event->reason() == Qt::MouseFocusReason;
-    viewport()->update();
-}
-
-void ListWidget::focusOutEvent(QFocusEvent* event) {
-    QAbstractScrollArea::focusOutEvent(event);
-    editTimer_.stop();
-    viewport()->update();
+    auto found = list_->FindItem(FromQt(text), Where::Text, IndexOf(first), How::Partial);
+    if (!found && first > 0) found = list_->FindItem(FromQt(text), Where::Text, 1, How::Partial);
+    return found ? std::optional(static_cast<Position>(found->Index() - 1)) : std::nullopt;
 }
 
 void ListWidget::FitColumn(int column) {

@@ -1,11 +1,8 @@
 #include <QPainter>
-#include <QStyleOptionFocusRect>
 #include <QTextLayout>
 #include <algorithm>
-#include <cmath>
 
 #include "hosts/qt/Convert.h"
-#include "hosts/qt/LabelPeer.h"
 #include "hosts/qt/ListWidget.h"
 
 /// How a list looks.
@@ -13,29 +10,12 @@ namespace tessel::qt {
 
 namespace {
 
-QColor Mixed(const QColor& first, const QColor& second, float share) {
-    const auto part = [share](float a, float b) { return a + (b - a) * share; };
-    return QColor::fromRgbF(part(first.redF(), second.redF()), part(first.greenF(), second.greenF()),
-                            part(first.blueF(), second.blueF()));
-}
-
-bool IsDark(const QColor& color) {
-    constexpr int middle = 128;
-    return color.lightness() < middle;
-}
-
-/// Each text runs in its own direction, so that a name reads the same in a view from right to left.
-void DirectBy(QPainter& painter, const QString& text) {
-    painter.setLayoutDirection(text.isRightToLeft() ? Qt::RightToLeft : Qt::LeftToRight);
-}
-
 /// Paints a label in up to two centred lines, the last one shortened.
 void PaintLines(QPainter& painter, const QRect& place, const QString& text, bool wrap) {
     const QFontMetrics metrics = painter.fontMetrics();
     QTextLayout layout(text, painter.font());
     QTextOption option(Qt::AlignHCenter);
     option.setWrapMode(wrap ? QTextOption::WrapAtWordBoundaryOrAnywhere : QTextOption::NoWrap);
-    DirectBy(painter, text);
     option.setTextDirection(painter.layoutDirection());
     layout.setTextOption(option);
     layout.beginLayout();
@@ -57,51 +37,8 @@ void PaintLines(QPainter& painter, const QRect& place, const QString& text, bool
 
 }  // namespace
 
-QString ListWidget::OneLine(QString text) {
-    // A name may have line breaks: they are seen, and take no line.
-    constexpr QChar shownBreak(0x21B5);
-    for (QChar& unit : text)
-        if (unit == '\n' || unit == '\r' || unit == QChar::LineSeparator || unit == QChar::ParagraphSeparator) unit = shownBreak;
-    return text;
-}
-
-ListWidget::Colors ListWidget::ColorsNow() const {
-    constexpr float halfway = 0.5f, gridShare = 0.14f, faintShare = 0.16f, idleShare = 0.72f;
-    const frame::SystemColors& system = list_->Host().Colors();
-    const auto colorOf = [&](frame::OLE_COLOR color, QPalette::ColorRole role) {
-        // What the palette stands for is that of this widget.
-        const bool isOwn = color == (role == QPalette::Base ? frame::colors::windowBackground : frame::colors::windowText);
-        return isOwn ? palette().color(role) : ToQt(color, system);
-    };
-    Colors colors;
-    colors.back = colorOf(look_.back, QPalette::Base);
-    colors.text = colorOf(look_.fore, QPalette::Text);
-    if (look_.back.IsSystem() && IsDark(colors.back)) colors.text = Readable(colors.text, colors.back);
-    if (!isEnabled()) colors.text = Mixed(colors.text, colors.back, halfway);
-    colors.pale = Mixed(colors.text, colors.back, halfway);
-    const QColor highlight = palette().color(QPalette::Active, QPalette::Highlight);
-    const bool isActive = hasFocus() || (editor_ && editor_->hasFocus());
-    colors.mark = isActive ? highlight : Mixed(Mixed(highlight, colors.text, 0.25f), colors.back, idleShare);
-    colors.markedText = isActive ? palette().color(QPalette::Active, QPalette::HighlightedText) : colors.text;
-    colors.faintMark = Mixed(highlight, colors.back, 1 - faintShare);
-    colors.grid = Mixed(colors.text, colors.back, 1 - gridShare);
-    return colors;
-}
-
-void ListWidget::paintEvent(QPaintEvent* event) {
-    QPainter painter(viewport());
-    if (!list_) return painter.fillRect(event->rect(), palette().base());
-    if (iconScale_ != devicePixelRatioF()) icons_.clear();
-    iconScale_ = devicePixelRatioF();
-    const Colors colors = ColorsNow();
-    painter.setFont(font());
-    painter.fillRect(event->rect(), colors.back);
-    PaintBackground(painter);
-    const QRect exposed = ToViewport(event->rect().translated(Scrolled())).translated(Scrolled());
-    for (const child::RowRange range : layout_.Touched(exposed))
-        for (Position row = range.first; row < range.first + range.count && row < list_->Rows().Count(); ++row)
-            PaintRow(painter, row, colors);
-    if (look_.grid && IsReport()) PaintGrid(painter, exposed, colors);
+void ListWidget::PaintAbove(QPainter& painter, const QRect& exposed, const Colors& colors) const {
+    if (view_.grid && IsReport()) PaintGrid(painter, exposed, colors);
     if (band_) {
         const QRect band = ToViewport(*band_);
         QColor fill = palette().color(QPalette::Highlight);
@@ -113,23 +50,23 @@ void ListWidget::paintEvent(QPaintEvent* event) {
     }
 }
 
-void ListWidget::PaintBackground(QPainter& painter) const {
+void ListWidget::PaintBehind(QPainter& painter) const {
     using Alignment = child::ListPictureAlignmentConstants;
-    if (!look_.picture) return;
-    const QImage image = ToQt(*look_.picture, devicePixelRatioF());
+    if (!view_.picture) return;
+    const QImage image = ToQt(*view_.picture, devicePixelRatioF());
     if (image.isNull()) return;
-    const QSize size(Pixels(look_.picture->Width()), Pixels(look_.picture->Height()));
+    const QSize size(Pixels(view_.picture->Width()), Pixels(view_.picture->Height()));
     if (size.isEmpty()) return;
     const QRect room = viewport()->rect();
     painter.setRenderHint(QPainter::SmoothPixmapTransform);
-    if (look_.alignment == Alignment::Tile) {
+    if (view_.alignment == Alignment::Tile) {
         for (int y = 0; y < room.height(); y += size.height())
             for (int x = 0; x < room.width(); x += size.width()) painter.drawImage(QRect(QPoint(x, y), size), image);
         return;
     }
-    const auto is = [&](Alignment one, Alignment other) { return look_.alignment == one || look_.alignment == other; };
+    const auto is = [&](Alignment one, Alignment other) { return view_.alignment == one || view_.alignment == other; };
     QRect place(QPoint(), size);
-    if (look_.alignment == Alignment::Center) place.moveCenter(room.center());
+    if (view_.alignment == Alignment::Center) place.moveCenter(room.center());
     if (is(Alignment::TopRight, Alignment::BottomRight)) place.moveRight(room.right());
     if (is(Alignment::BottomLeft, Alignment::BottomRight)) place.moveBottom(room.bottom());
     painter.drawImage(place, image);
@@ -141,43 +78,30 @@ void ListWidget::PaintRow(QPainter& painter, Position row, const Colors& colors)
     const QString text = LabelText(row);
     const Label label = LabelOf(row, text);
     const bool isFocus = currentIndex().row() == static_cast<int>(row);
-    const bool hidesMark = look_.hideSelection && !hasFocus() && !editor_;
-    const bool isMarked = rows.Selected(id) && !hidesMark, isHot = hot_ == row && look_.hot;
+    const bool isMarked = rows.Selected(id) && ShowsMark(), isHot = hot_ == row && look_.hot;
     const QRect mark = ToViewport(label.mark);
-    if (isMarked)
-        painter.fillRect(mark, isHot ? Mixed(colors.mark, colors.back, 0.12f) : colors.mark);
-    else if (isHot)
-        painter.fillRect(mark, colors.faintMark);
+    PaintMark(painter, label.mark, isMarked, isHot, colors);
     QColor ink = isMarked ? colors.markedText : colors.text;
     if (rows.Ghosted(id)) ink = isMarked ? Mixed(colors.markedText, colors.mark, 0.3f) : colors.pale;
     if (!label.mark.isEmpty()) {
-        PaintIcon(painter, row, label.icon, isMarked && !(IsReport() && look_.fullRow), colors);
+        PaintIcon(painter, label.icon, rows.Icon(id, IsLargeIcons() ? child::IconSize::Large : child::IconSize::Small),
+                  {.pale = rows.Ghosted(id), .tinted = isMarked && !(IsReport() && look_.fullRow)}, colors);
         painter.setPen(ink);
         const QRect place = ToViewport(label.text);
         if (IsLargeIcons()) {
-            PaintLines(painter, place, text, look_.wrap);
-        } else {
-            const Qt::Alignment alignment =
-                IsReport() && list_->ColumnHeaders.Count() > 0 ? ToQt(list_->ColumnHeaders.Item(1).Alignment()) : Qt::AlignLeft;
             DirectBy(painter, text);
-            painter.drawText(
-                place,
-                static_cast<int>(QStyle::visualAlignment(layoutDirection(), alignment | Qt::AlignVCenter)) | Qt::TextSingleLine,
-                painter.fontMetrics().elidedText(text, Qt::ElideRight, place.width()));
+            PaintLines(painter, place, text, view_.wrap);
+        } else {
+            PaintLine(
+                painter, place, text,
+                IsReport() && list_->ColumnHeaders.Count() > 0 ? ToQt(list_->ColumnHeaders.Item(1).Alignment()) : Qt::AlignLeft);
         }
     }
     if (IsReport()) PaintSubItems(painter, row, look_.fullRow ? ink : rows.Ghosted(id) ? colors.pale : colors.text);
-    if (!isFocus || !hasFocus() || mark.isEmpty()) return;
-    QStyleOptionFocusRect option;
-    option.initFrom(this);
-    option.rect = mark;
-    option.backgroundColor = isMarked ? colors.mark : colors.back;
-    option.state |= QStyle::State_KeyboardFocusChange | QStyle::State_HasFocus;
-    style()->drawPrimitive(QStyle::PE_FrameFocusRect, &option, &painter, this);
+    if (isFocus && hasFocus() && !mark.isEmpty()) PaintFocus(painter, mark, isMarked ? colors.mark : colors.back);
 }
 
 void ListWidget::PaintSubItems(QPainter& painter, Position row, const QColor& text) const {
-    const QFontMetrics metrics = painter.fontMetrics();
     painter.setPen(text);
     for (int column = 1; column < list_->ColumnHeaders.Count() && column < header_.count(); ++column) {
         if (header_.isSectionHidden(column)) continue;
@@ -186,40 +110,8 @@ void ListWidget::PaintSubItems(QPainter& painter, Position row, const QColor& te
         const QRect place = cell.adjusted(edge, 0, -edge, 0);
         const QString words = OneLine(model_.Text(static_cast<int>(row), column));
         if (words.isEmpty() || place.width() <= 0) continue;
-        const Qt::Alignment alignment = ToQt(list_->ColumnHeaders.Item(column + 1).Alignment()) | Qt::AlignVCenter;
-        DirectBy(painter, words);
-        painter.drawText(place, static_cast<int>(QStyle::visualAlignment(layoutDirection(), alignment)) | Qt::TextSingleLine,
-                         metrics.elidedText(words, Qt::ElideRight, place.width()));
+        PaintLine(painter, place, words, ToQt(list_->ColumnHeaders.Item(column + 1).Alignment()));
     }
-}
-
-void ListWidget::PaintIcon(QPainter& painter, Position row, QRect place, bool marked, const Colors& colors) {
-    child::ImageList* const images = Images();
-    if (!images || place.isEmpty()) return;
-    const child::RowId id = list_->Rows().At(row);
-    const frame::Variant key = list_->Rows().Icon(id, IsLargeIcons() ? child::IconSize::Large : child::IconSize::Small);
-    const child::ListImage* image = images->Images().Find(key);
-    if (!image || !image->ShownPicture()) return;
-    auto& [held, pixels] = icons_[image->ShownPicture().get()];
-    if (!held) {
-        held = image->ShownPicture();
-        pixels = IconOf(images, key, iconScale_);
-    }
-    if (pixels.isNull()) return;
-    constexpr double ghost = 0.45;
-    const QRect at = ToViewport(place);
-    painter.setOpacity(list_->Rows().Ghosted(id) || !isEnabled() ? ghost : 1);
-    painter.drawPixmap(at, pixels);
-    if (marked) {  // a breath of the mark over the icon
-        QPixmap tint = pixels;
-        QPainter tinting(&tint);
-        tinting.setCompositionMode(QPainter::CompositionMode_SourceIn);
-        tinting.fillRect(QRect(QPoint(), place.size()), colors.mark);
-        tinting.end();
-        painter.setOpacity(painter.opacity() * 0.4);
-        painter.drawPixmap(at, tint);
-    }
-    painter.setOpacity(1);
 }
 
 void ListWidget::PaintGrid(QPainter& painter, const QRect& exposed, const Colors& colors) const {
@@ -238,7 +130,7 @@ void ListWidget::PaintGrid(QPainter& painter, const QRect& exposed, const Colors
 }
 
 QString ListWidget::FullTextAt(QPoint at) const {
-    const auto row = list_ ? layout_.At(ToContents(at)) : std::nullopt;
+    const auto row = layout_.At(ToContents(at));
     if (!row) return {};
     const int column = IsReport() && list_->ColumnHeaders.Count() > 0 ? header_.logicalIndexAt(at.x()) : 0;
     if (column < 0) return {};
@@ -246,7 +138,7 @@ QString ListWidget::FullTextAt(QPoint at) const {
     const int width = fontMetrics().horizontalAdvance(text);
     if (column > 0) return width > header_.sectionSize(column) - 2 * edge ? text : QString();
     const QSize room = LabelOf(*row, text).text.size();
-    const int lines = IsLargeIcons() && look_.wrap ? 2 : 1;
+    const int lines = IsLargeIcons() && view_.wrap ? 2 : 1;
     return width > room.width() * lines ? text : QString();
 }
 

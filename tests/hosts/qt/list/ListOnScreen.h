@@ -1,83 +1,18 @@
 #pragma once
 
-#include <gtest/gtest.h>
 #include <QApplication>
 #include <QHeaderView>
 #include <QPainter>
 #include <QScrollBar>
-#include <QTest>
-#include <memory>
 #include <string>
 
 #include "frame/Text.h"
-#include "hosts/headless/HeadlessHost.h"
-#include "hosts/qt/ControlWidget.h"
-#include "hosts/qt/Convert.h"
-#include "hosts/qt/Host.h"
 #include "hosts/qt/ListViewPeer.h"
 #include "hosts/qt/ListWidget.h"
 #include "tests/frame/child/ListOwner.h"
+#include "tests/hosts/qt/OnScreen.h"
 
 namespace tessel::qt::test {
-
-/// A control of the tests as a widget, which nobody listens to.
-template <class Owner>
-class OwnerWidget final : public ControlWidget {
-  public:
-    explicit OwnerWidget(QWidget* parent) : ControlWidget(Class(), parent) {}
-    Owner& owner() const { return static_cast<Owner&>(control()); }
-
-  protected:
-    bool hears(const frame::EventInfo&) const override { return false; }
-    void raise(const frame::EventInfo&, frame::EventArguments) override {}
-
-  private:
-    static const frame::ControlClass& Class() {
-        static constexpr frame::ClassTable table{.name = "Owner", .members = {}};
-        static const frame::ControlClass controlClass{
-            &table, [](frame::Host& host) -> std::unique_ptr<frame::Control> { return std::make_unique<Owner>(host); }};
-        return controlClass;
-    }
-};
-
-/// A window with one control of the tests on it, and the services of the headless host behind it but for those of the screen.
-template <class Owner>
-class OnScreen {
-  public:
-    OnScreen(int width, int height) {
-        window.resize(width, height);
-        widget->resize(width, height);
-        window.show();
-        window.activateWindow();
-        if (!QTest::qWaitForWindowActive(&window)) ADD_FAILURE() << "the window did not become active";
-    }
-    ~OnScreen() {
-        widget.reset();
-        QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
-    }
-    void Settle() { host->frameHost().Settle(); }
-
-  private:
-    headless::HeadlessHost lent_;
-    frame::Services Lent() {
-        frame::Services services = lent_.LentServices();
-        services.loop = nullptr;
-        services.peers = nullptr;
-        services.focus = nullptr;
-        services.colors = nullptr;
-        services.metrics = nullptr;
-        return services;
-    }
-
-  public:
-    headless::ErrorList& errors = lent_.errors;
-    std::shared_ptr<qt::Host> host = qt::Host::make(Lent());
-    QWidget window;
-    std::unique_ptr<OwnerWidget<Owner>> widget = [this] {
-        Host::attach(&window, host);
-        return std::make_unique<OwnerWidget<Owner>>(&window);
-    }();
-};
 
 /// A list that fills its window.
 class ListOnScreen : public OnScreen<tessel::test::ListOwner> {
@@ -107,12 +42,7 @@ class ListOnScreen : public OnScreen<tessel::test::ListOwner> {
     }
     void Key(int key, Qt::KeyboardModifiers modifiers = {}) { QTest::keyClick(&view(), static_cast<Qt::Key>(key), modifiers); }
 
-    /// What is painted at a point of the inside, at any scale of the screen.
-    QColor Pixel(int x, int y) {
-        const QPixmap seen = port()->grab();
-        const double scale = seen.devicePixelRatio();
-        return seen.toImage().pixelColor(static_cast<int>((x + 0.5) * scale), static_cast<int>((y + 0.5) * scale));
-    }
+    QColor Pixel(int x, int y) { return PixelOf(*port(), x, y); }
     QColor Pixel(QPoint at) { return Pixel(at.x(), at.y()); }
 
     /// The texts of the selected rows, with "*" behind that of the focus row, and of a focus row that is not selected in brackets.

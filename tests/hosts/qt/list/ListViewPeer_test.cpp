@@ -19,15 +19,6 @@ using child::ListViewConstants;
 constexpr std::array allViews = {ListViewConstants::Report, ListViewConstants::Icon, ListViewConstants::SmallIcon,
                                  ListViewConstants::List};
 
-frame::PictureRef Square(int size, std::uint32_t color, std::vector<double> scales = {1}) {
-    std::vector<frame::PixelPlane> planes;
-    for (const double scale : scales) {
-        const int side = static_cast<int>(size * scale);
-        planes.push_back({scale, side, side, std::vector<std::uint32_t>(static_cast<std::size_t>(side * side), color)});
-    }
-    return std::make_shared<frame::Picture>(std::move(planes), "");
-}
-
 /// A list of twenty rows with the columns "Name" and "Number".
 struct Rows20 : ListOnScreen {
     Rows20() {
