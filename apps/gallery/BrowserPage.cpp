@@ -102,6 +102,7 @@ void BrowserPage::restore() {
     constexpr int refreshEach = 2000;
     tree_->setRefreshInterval(refreshEach);
     tree_->setAutoFillSubFolders(true);
+    tree_->setBorderStyle(qt::FolderView::FixedSingle);
     files_->setRefreshInterval(refreshEach);
     files_->setMultiSelect(true);
     files_->setFullRowSelect(true);
@@ -184,6 +185,7 @@ void BrowserPage::reveal(const QString& folder) {
         if (const child::TreeNodeRef node = nodeOf(path)) {
             if (path != folder) node->SetExpanded(true);
             node->EnsureVisible();
+            node->SetSelected(true);
         }
     tree_->setPath(folder);
 }

@@ -41,6 +41,7 @@ void FolderView::DesignTree() {
     TreeFolders.Move(0, 0, designSize.width, designSize.height);
     TreeFolders.SetForeColor(frame::colors::buttonText);
     TreeFolders.SetImageList(&Image16);
+    TreeFolders.SetHideSelection(false);  // the current folder is to be seen wherever the user works
 }
 
 void FolderView::Connect() {

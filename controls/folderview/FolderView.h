@@ -241,8 +241,8 @@ class FolderView final : public frame::Control {
     void SetFolderImage(NodeId node, const FoundFolder& folder);
     void SetFolderImage(NodeId node, const fileservices::Folder& folder);
     void SetDriveImage(NodeId node, const fileservices::DriveRef& drive);
-    void SetImages(NodeId node, std::string_view path, const std::string& key);
-    void AddFolderIcons(const std::string& path, const std::string& key);
+    std::string SetImages(NodeId node, std::string_view path, std::string key);
+    void AddFolderIcons(const std::string& path, std::string& key);
     void SetHiddenImages(NodeId node, const std::string& key);
     void SetPaleImage(NodeId node, child::NodeImage which, const std::string& key);
 

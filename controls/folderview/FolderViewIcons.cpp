@@ -17,8 +17,7 @@ std::string Prefixed(std::string_view prefix, std::string_view key) { return std
 }  // namespace
 
 void FolderView::SetFolderImage(NodeId node, const FoundFolder& folder) {
-    const std::string key = Disk().TypeText(folder.record.typeId);
-    SetImages(node, folder.path, key);
+    const std::string key = SetImages(node, folder.path, Disk().TypeText(folder.record.typeId));
     if (!folder.IsRootFolder() && (folder.record.attributes & frame::attributes::hidden) != 0) SetHiddenImages(node, key);
 }
 
@@ -32,7 +31,8 @@ void FolderView::SetDriveImage(NodeId node, const fileservices::DriveRef& drive)
     SetImages(node, drive->RootPath(), Host().Module<fileservices::FileSys>().DriveTypeWord(drive));
 }
 
-void FolderView::SetImages(NodeId node, std::string_view path, const std::string& key) {
+/// Gives the key under which the images stand: that of the drive where the path is the top folder of one.
+std::string FolderView::SetImages(NodeId node, std::string_view path, std::string key) {
     if (Tree().SetImageKey(node, NodeImage::Plain, key).Failed()) {
         AddFolderIcons(std::string(path), key);
         ResumeNext again;
@@ -40,20 +40,20 @@ void FolderView::SetImages(NodeId node, std::string_view path, const std::string
     }
     ResumeNext next;
     next([&] { return Tree().SetImageKey(node, NodeImage::Selected, Prefixed(openPrefix, key)); });
+    return key;
 }
 
-void FolderView::AddFolderIcons(const std::string& path, const std::string& key) {
+/// `key` becomes that of the icon.
+void FolderView::AddFolderIcons(const std::string& path, std::string& key) {
     using fileservices::IconForm;
-    const auto add = [&](IconForm form, const std::string& imageKey) {
+    const auto add = [&](IconForm form, std::string_view prefix) {
         ResumeNext next;
-        std::string iconKey;
         const bool drawn = next.Value(
-            [&] { return Host().Module<FileIcon>().GetFileIcon(path, fileservices::IconSize::Small, TempPic, iconKey, form); },
-            false);
-        if (drawn) next([&] { Image16.ListImages.Add({}, imageKey, TempPic.Picture()); });
+            [&] { return Host().Module<FileIcon>().GetFileIcon(path, fileservices::IconSize::Small, TempPic, key, form); }, false);
+        if (drawn) next([&] { Image16.ListImages.Add({}, Prefixed(prefix, key), TempPic.Picture()); });
     };
-    add(IconForm::Closed, key);
-    add(IconForm::Open, Prefixed(openPrefix, key));
+    add(IconForm::Closed, {});
+    add(IconForm::Open, openPrefix);
 }
 
 void FolderView::SetHiddenImages(NodeId node, const std::string& key) {

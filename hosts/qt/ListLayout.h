@@ -44,6 +44,10 @@ struct ListLayout {
     QPoint IntoView(Position row, QPoint scrolled) const;
     /// The greatest offset.
     QPoint Limit() const;
+    /// Whether rows that are in both stand in the same place, and as much of them is seen.
+    bool StandsAs(const ListLayout& other) const {
+        return flow == other.flow && cell == other.cell && window == other.window && contentWidth == other.contentWidth;
+    }
 
   private:
     int Lines() const;

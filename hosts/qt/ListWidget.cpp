@@ -96,16 +96,18 @@ void ListWidget::Follow() {
     if (rowsMoved && changes.front().kind == RowChange::Kind::Reset) sampledFor_ = 0;
     model_.Follow(changes);
     const bool newColumns = header_.Follow();
-    if (rowsMoved || isNewLook || newColumns) {
-        updateGeometries();
+    const ListLayout before = layout_;
+    if (rowsMoved || isNewLook || newColumns) updateGeometries();
+    const bool isUnseen = !isNewLook && !newColumns && layout_.StandsAs(before) && IsBehindView(changes);
+    if ((rowsMoved && !isUnseen) || isNewLook || newColumns) {
         FollowScroll(changes);
         if (const auto row = model_.PositionOf(top); row && isNewView) ScrollToTop(*row);
         if (firstTop > 1) ScrollToTop(static_cast<Position>(firstTop - 1));
         hot_.reset();
         viewport()->update();
         RememberSeen();
-        if (rowsMoved && QAccessible::isActive()) RowAccessible::TellRows(*this);
     }
+    if (rowsMoved && QAccessible::isActive()) RowAccessible::TellRows(*this);
     FollowFocus();
     FollowEdit();
 }

@@ -66,6 +66,15 @@ void RowView::TakeSize() {
     QCoreApplication::sendEvent(this, &resized);
 }
 
+bool RowView::IsBehindView(const std::vector<RowChange>& changes) const {
+    Position end = 0;
+    for (const child::RowRange range : layout_.Touched(QRect(Scrolled(), layout_.window)))
+        end = std::max(end, range.first + range.count);
+    return std::all_of(changes.begin(), changes.end(), [&](const RowChange& change) {
+        return !Moves(change) || (change.kind == RowChange::Kind::Inserted && change.first >= end);
+    });
+}
+
 void RowView::FollowScroll(const std::vector<RowChange>& changes) {
     const auto has = [&](RowChange::Kind kind) {
         return std::any_of(changes.begin(), changes.end(), [&](const RowChange& change) { return change.kind == kind; });

@@ -144,6 +144,8 @@ class RowView : public QAbstractItemView {
     void TakeLook(const Look& look);
     /// A widget that is not shown yet has its size all the same.
     void TakeSize();
+    /// Whether all that has moved stands behind what is in view, by the layout as it is now.
+    bool IsBehindView(const std::vector<child::RowChange>& changes) const;
     void FollowScroll(const std::vector<child::RowChange>& changes);
     void FollowFocus();
     void FollowEdit();
