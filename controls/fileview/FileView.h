@@ -348,6 +348,7 @@ class FileView final : public frame::Control {
         bool AtMyFolders = false;
         child::RowRef LastAddedItem;
         bool Busy = false;  // a listing or a search runs, or has not found its folder: nothing is refreshed
+        int listings = 0;   // that add rows at this moment, one within the turns of another
         bool ChangesFound = false;
         bool AddCancelled = false;  // the application has cancelled the adding of a file: a search ends
     };

@@ -69,8 +69,10 @@ void FileView::ListFolder() {
     next([&] { AddTreeToTotal(folder); });
     std::unique_ptr<frame::FolderListing> listing;
     next([&] { return Disk().List(folder, listing); });
+    ++own.listings;
     if (own.ShowFolders && listing) AddSubFolders(folder, *listing);
     if (listing) AddFiles(folder, *listing);
+    --own.listings;
     own.Busy = false;
 }
 

@@ -46,6 +46,7 @@ void FileView::FinishCounting() {
 bool FileView::WorkInIdleTime() {
     constexpr std::size_t entriesAtOnce = 4000, foldersAtOnce = 16;
     if (!Site()) return false;
+    if (own.listings > 0) return true;  // rows come first
     if (own.unmeasured.empty()) {
         rows_.CountSome(foldersAtOnce);
     } else if (frame::TreeSize& tree = *own.unmeasured.back(); !tree.Step(entriesAtOnce)) {
