@@ -3,6 +3,7 @@
 #include <benchmark/benchmark.h>
 
 #include <algorithm>
+#include <cstdint>
 #include <map>
 #include <string>
 #include <utility>
@@ -68,5 +69,10 @@ class Contest {
     std::vector<double> own_;
     std::map<std::string, std::vector<double>> peers_, others_;
 };
+
+/// Ends a benchmark as failed that has not done its work.
+inline void Expect(benchmark::State& state, std::int64_t found, std::int64_t expected) {
+    if (found != expected) state.SkipWithError(("found " + std::to_string(found) + " of " + std::to_string(expected)).c_str());
+}
 
 }  // namespace tessel::bench

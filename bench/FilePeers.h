@@ -57,6 +57,16 @@ inline std::int64_t BareListing(const std::string& path) {
     return sum;
 }
 
+/// How many of the paths are folders: one question each.
+inline std::int64_t BareExistence(const std::vector<std::string>& paths) {
+    std::int64_t count = 0;
+    for (const std::string& path : paths) {
+        struct statx told {};
+        if (statx(AT_FDCWD, path.c_str(), 0, STATX_TYPE, &told) == 0 && S_ISDIR(told.stx_mode)) ++count;
+    }
+    return count;
+}
+
 enum class Depth { Names, NamesAndFacts };
 
 /// The facts of every entry, and the number of entries in each folder among them.

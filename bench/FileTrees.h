@@ -91,6 +91,26 @@ class FileTrees {
             }
         });
     }
+    /// So many folders with nothing in them.
+    const std::string& EmptyFolders(std::int64_t folders) {
+        return Made("empty" + std::to_string(folders), [&](const std::string& path) {
+            for (std::int64_t i = 0; i < folders; ++i)
+                std::filesystem::create_directory(path + "/Holidays " + std::to_string(i * 7919 % folders));
+        });
+    }
+    static constexpr std::int64_t wideFolders = 99, foldersEach = 1010;
+    /// About 100,000 folders: itself, 99 in it, and 1,010 in each of these.
+    static constexpr std::int64_t folderTreeNodes = 1 + wideFolders * (1 + foldersEach);
+    const std::string& FolderTree() {
+        return Made("foldertree", [&](const std::string& path) {
+            for (std::int64_t wide = 0; wide < wideFolders; ++wide) {
+                const std::string folder = path + "/Year " + std::to_string(1900 + wide);
+                std::filesystem::create_directory(folder);
+                for (std::int64_t i = 0; i < foldersEach; ++i)
+                    std::filesystem::create_directory(folder + "/Place " + std::to_string(i));
+            }
+        });
+    }
     static constexpr std::int64_t treeFiles = 204'000, treeMatches = treeFiles / 8;
     /// 200,000 files in 2,040 folders in two levels. Each eighth file is a text. They are further names of the files of `Flat`:
     /// quicker to make.

@@ -30,6 +30,7 @@ namespace tessel::qt {
 namespace {
 
 using bench::Contest;
+using bench::Expect;
 using bench::FileTrees;
 
 constexpr int width = 800, height = 600;
@@ -244,10 +245,6 @@ class ToolkitView {
     QFileSystemModel model_;
     QTreeView view_;
 };
-
-void Expect(benchmark::State& state, std::int64_t found, std::int64_t expected) {
-    if (found != expected) state.SkipWithError(("found " + std::to_string(found) + " of " + std::to_string(expected)).c_str());
-}
 
 void OnScreen(benchmark::State& state) {
     const std::string& path = FileTrees::Instance().Flat(state.range(0));

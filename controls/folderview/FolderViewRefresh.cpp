@@ -34,11 +34,12 @@ void FolderView::RefreshTree() {
 }
 
 void FolderView::RefreshNodeStatus(NodeId node) {
-    const std::string key(Tree().Key(node));
+    const std::string_view key = Tree().Key(node);
     if (key.empty() || folderwords::IsWord(key)) return;
     const NodeId parent = Tree().Parent(node);
-    if (parent != child::noNode && EqualsNoCase(Tree().Key(parent), folderwords::myFolders)) return RefreshMyFolder(node, key);
-    if (Disk().DriveExists(key)) return RefreshDrive(node, key);
+    if (parent != child::noNode && EqualsNoCase(Tree().Key(parent), folderwords::myFolders))
+        return RefreshMyFolder(node, std::string(key));
+    if (Disk().DriveExists(key)) return RefreshDrive(node, std::string(key));
     if (!Disk().FolderExists(key)) Tree().Remove(node);
 }
 

@@ -1,6 +1,5 @@
 #include "frame/child/NodeNames.h"
 
-#include <algorithm>
 #include <utility>
 
 #include "frame/Text.h"
@@ -9,52 +8,59 @@
 namespace tessel::child {
 
 void NodeNames::Begin(NodeId node, std::string_view text, std::string_view key) {
-    blocks_.MakeRoom(node);
-    Write(node, text, key);
-    Index(node, key);
+    places_.MakeRoom(node);
+    Put(node, text, key);
 }
 
 void NodeNames::End(NodeId node) {
-    Unindex(node);
-    blocks_[node].reset();
+    Drop(std::exchange(places_[node].place, NameStore::none));
+    Tidy();
 }
 
-void NodeNames::Clear() {
-    blocks_.Clear();
-    keys_.Clear();
-}
+void NodeNames::Clear() { *this = NodeNames(); }
 
-void NodeNames::SetKey(NodeId node, std::string_view key) {
-    Unindex(node);
-    Write(node, Text(node), key);
-    Index(node, Key(node));  // `key` may have stood in the old block
+void NodeNames::Set(NodeId node, std::string_view text, std::string_view key) {
+    const NameStore::Place before = places_[node].place;
+    Put(node, text, key);
+    Drop(before);
+    Tidy();
 }
 
 std::optional<NodeId> NodeNames::FindKey(std::string_view key) const {
     if (key.empty()) return std::nullopt;
-    const NodeId found = keys_.Find(HashIndex::HashOf(key), [&](NodeId node) {
-        const std::string_view candidate = Key(node);
-        return candidate == key || frame::EqualsNoCase(candidate, key);
+    NodeId node = noNode;
+    const NameStore::Place found = keys_.Find(HashIndex::HashOf(key), [&](NameStore::Place place) {
+        const NameStore::Name name = names_.Read(place);
+        node = name.row;
+        return name.key == key || frame::EqualsNoCase(name.key, key);
     });
-    return found != KeyIndex::none ? std::optional(found) : std::nullopt;
+    return found != KeyIndex::none ? std::optional(node) : std::nullopt;
 }
 
-void NodeNames::Index(NodeId node, std::string_view key) {
-    if (!key.empty()) keys_.Add(node, HashIndex::HashOf(key));
+void NodeNames::Put(NodeId node, std::string_view text, std::string_view key) {
+    const NameStore::Place place = names_.Add(node, text, key);
+    places_[node].place = place;
+    const std::string_view kept = names_.Read(place).key;
+    if (!kept.empty()) keys_.Add(place, HashIndex::HashOf(kept));
 }
 
-void NodeNames::Unindex(NodeId node) {
-    if (const std::string_view key = Key(node); !key.empty()) keys_.Remove(node, HashIndex::HashOf(key));
+void NodeNames::Drop(NameStore::Place place) {
+    const std::string_view key = names_.Read(place).key;
+    if (!key.empty()) keys_.Remove(place, HashIndex::HashOf(key));
+    droppedBytes_ += names_.SizeOf(place);
 }
 
-void NodeNames::Write(NodeId node, std::string_view text, std::string_view key) {
-    const auto textSize = static_cast<std::uint32_t>(text.size()), keySize = static_cast<std::uint32_t>(key.size());
-    // Made before the old block goes, which may hold one of the two.
-    std::unique_ptr<char[]> block(new char[sizesBytes + text.size() + key.size()]);
-    std::memcpy(block.get(), &textSize, sizeof textSize);
-    std::memcpy(block.get() + sizeof textSize, &keySize, sizeof keySize);
-    std::copy(key.begin(), key.end(), std::copy(text.begin(), text.end(), block.get() + sizesBytes));
-    blocks_[node] = std::move(block);
+/// The names are gathered anew when what was dropped outweighs them and the way along all places: so it costs little each time.
+void NodeNames::Tidy() {
+    if (droppedBytes_ <= names_.Size() - droppedBytes_ + places_.Size()) return;
+    const NameStore before = std::exchange(names_, NameStore());
+    keys_.Clear();
+    droppedBytes_ = 0;
+    for (NodeId node = 0; node < places_.Size(); ++node) {
+        if (places_[node].place == NameStore::none) continue;
+        const NameStore::Name name = before.Read(places_[node].place);
+        Put(node, name.text, name.key);
+    }
 }
 
 }  // namespace tessel::child

@@ -1,19 +1,18 @@
 #pragma once
 
 #include <cstddef>
-#include <cstdint>
-#include <cstring>
-#include <memory>
 #include <optional>
 #include <string_view>
 
 #include "frame/child/KeyIndex.h"
+#include "frame/child/NameStore.h"
 #include "frame/child/NodeShape.h"
 
 namespace tessel::child {
 
-/// The texts and keys of the nodes of a tree, those of a node in one block, and who has a key. Without regard to case a key is
-/// unique; that is its user's care. 26 to 36 bytes a node besides the block's own characters, and what its allocation takes.
+/// The texts and keys of the nodes of a tree, and who has a key. Without regard to case a key is unique; that is its user's care.
+/// 14 to 24 bytes a node besides what the store of names takes. A search for a key looks at two places in memory: the index and the
+/// name.
 class NodeNames {
   public:
     /// A new node; the empty key is none.
@@ -21,41 +20,28 @@ class NodeNames {
     void End(NodeId node);
     void Clear();
 
-    /// Good until the node's text or key is set.
-    std::string_view Text(NodeId node) const {
-        const Name name = Read(node);
-        return {name.characters, name.textSize};
-    }
-    std::string_view Key(NodeId node) const {
-        const Name name = Read(node);
-        return {name.characters + name.textSize, name.keySize};
-    }
-    void SetText(NodeId node, std::string_view text) { Write(node, text, Key(node)); }
-    void SetKey(NodeId node, std::string_view key);
+    /// Good until any text or key is set, or a node ends.
+    std::string_view Text(NodeId node) const { return names_.Read(places_[node].place).text; }
+    std::string_view Key(NodeId node) const { return names_.Read(places_[node].place).key; }
+    /// What is set may be a text or key of these nodes.
+    void SetText(NodeId node, std::string_view text) { Set(node, text, Key(node)); }
+    void SetKey(NodeId node, std::string_view key) { Set(node, Text(node), key); }
     std::optional<NodeId> FindKey(std::string_view key) const;
 
   private:
-    /// What a block holds: the two sizes, the characters of the text and those of the key.
-    struct Name {
-        std::uint32_t textSize = 0, keySize = 0;
-        const char* characters = nullptr;
+    struct PlaceOfName {
+        NameStore::Place place = NameStore::none;
     };
-    static constexpr std::size_t sizesBytes = 2 * sizeof(std::uint32_t);
 
-    Name Read(NodeId node) const {
-        const char* block = blocks_[node].get();
-        Name name;
-        std::memcpy(&name.textSize, block, sizeof name.textSize);
-        std::memcpy(&name.keySize, block + sizeof name.textSize, sizeof name.keySize);
-        name.characters = block + sizesBytes;
-        return name;
-    }
-    void Index(NodeId node, std::string_view key);
-    void Unindex(NodeId node);
-    void Write(NodeId node, std::string_view text, std::string_view key);
+    void Set(NodeId node, std::string_view text, std::string_view key);
+    void Put(NodeId node, std::string_view text, std::string_view key);
+    void Drop(NameStore::Place place);
+    void Tidy();
 
-    RowPages<std::unique_ptr<char[]>> blocks_;
-    KeyIndex keys_;
+    RowPages<PlaceOfName> places_;
+    NameStore names_;
+    KeyIndex keys_;  // by the places of the names
+    std::size_t droppedBytes_ = 0;
 };
 
 }  // namespace tessel::child
