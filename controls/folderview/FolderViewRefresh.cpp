@@ -14,6 +14,17 @@ using fileservices::FolderRef;
 using frame::EqualsNoCase;
 using frame::ResumeNext;
 
+namespace {
+
+/// Of a drive that does not answer: a look into it may take for ever.
+bool IsUnreadyDrive(frame::Host& host, const std::string& path) {
+    if (!host.Files().DriveExists(path)) return false;
+    ResumeNext next;
+    return next.Value([&] { return !fileservices::FileSystemObject(host).GetDrive(path)->IsReady(); }, false);
+}
+
+}  // namespace
+
 void FolderView::Refresh() { RefreshTree(); }
 
 void FolderView::TimerElapsed() {
@@ -74,7 +85,9 @@ void FolderView::RefreshDrive(NodeId node, const std::string& root) {
 }
 
 void FolderView::RefreshNodeChildren(NodeRef node) {
-    const FolderRef folder = TakeFolder(KeyOf(node));
+    const std::string key = KeyOf(node);
+    if (IsUnreadyDrive(Host(), key)) return;
+    const FolderRef folder = TakeFolder(key);
     if (!folder) return;
     ResumeNext next;
     std::unique_ptr<frame::FolderListing> listing;

@@ -62,7 +62,8 @@ void FolderView::FillMyComputer() {
     for (const frame::DriveRecord& drive : Disk().Drives()) {
         if (!Site() || !Lives(root)) return;
         const NodeRef node = AddDriveNode(drive, root);
-        if (Lives(node)) FillSubFolders(node, TakeFolder(drive.root));
+        // A drive that does not answer is left alone: a look into it may take for ever.
+        if (Lives(node) && drive.isReady) FillSubFolders(node, TakeFolder(drive.root));
     }
 }
 

@@ -32,6 +32,7 @@ Variant PathOf(const frame::Object* object) { return object ? Variant(object->Pa
 int ScriptedDialogs::MsgBox(const std::string& text, int style, const std::string& title) {
     constexpr int buttons = 15;
     log_.Add({"msgbox", text, style, title});
+    if (onMsgBox) onMsgBox();
     const bool asksYesNo = (style & buttons) == frame::msgbox::yesNo;
     return TakeFrom(answers, asksYesNo ? frame::msgbox::answerYes : frame::msgbox::answerOk);
 }

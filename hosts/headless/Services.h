@@ -42,6 +42,7 @@ class ScriptedDialogs final : public frame::Dialogs {
     std::deque<int> answers;
     std::deque<std::optional<std::string>> fileNames;  ///< nothing for a cancelled dialog
     std::deque<std::function<void()>> forms;           ///< what the user does while a form is open
+    std::function<void()> onMsgBox;                    ///< what happens while a message box is open
 
   private:
     Log& log_;

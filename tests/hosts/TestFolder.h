@@ -19,8 +19,8 @@ namespace tessel::test {
 /// A folder of the real disk that is there as long as the test.
 class TestFolder {
   public:
-    TestFolder() {
-        std::string name = (std::filesystem::temp_directory_path() / "tessel-test-XXXXXX").string();
+    explicit TestFolder(const std::filesystem::path& parent = std::filesystem::temp_directory_path()) {
+        std::string name = (parent / "tessel-test-XXXXXX").string();
         if (!mkdtemp(name.data())) std::abort();
         path_ = name;
     }
@@ -32,6 +32,12 @@ class TestFolder {
         if (!error) return;
         GiveRights(path_);
         std::filesystem::remove_all(path_, error);
+    }
+
+    /// For a great many entries: a folder that the system keeps in memory, where it has one.
+    static std::filesystem::path QuickParent() {
+        const char* inMemory = "/dev/shm";
+        return access(inMemory, W_OK) == 0 ? std::filesystem::path(inMemory) : std::filesystem::temp_directory_path();
     }
 
     const std::string& Path() const { return path_; }

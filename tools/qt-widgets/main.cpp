@@ -64,7 +64,7 @@ QtType TypeOf(const TypeInfo& type) {
     }
 }
 
-/// Objects are told apart by the name of the member: the table knows no more than that it is one.
+/// Objects are told apart by the name of the member or parameter: the table knows no more than that it is one.
 QtType TypeOf(const Member& member) {
     if (member.type.type == VarType::Object && member.name == "Font") return {"QFont", "const QFont&", "%.value<QFont>()"};
     if (member.type.type == VarType::Object) return {"QImage", "const QImage&", "%.value<QImage>()"};
@@ -72,8 +72,8 @@ QtType TypeOf(const Member& member) {
 }
 
 /// The storage behind an argument of an event.
-std::string StorageOf(const TypeInfo& type) {
-    switch (type.type) {
+std::string StorageOf(const Parameter& parameter) {
+    switch (parameter.type.type) {
         case VarType::Boolean:
             return "bool";
         case VarType::Integer:
@@ -87,7 +87,7 @@ std::string StorageOf(const TypeInfo& type) {
         case VarType::String:
             return "std::string";
         case VarType::Object:
-            return "tessel::child::DragDataRef";  // the one object that events bring
+            return parameter.name == "Node" ? "tessel::child::TreeNodeRef" : "tessel::child::DragDataRef";
         default:
             return "tessel::frame::Variant";
     }
@@ -101,7 +101,7 @@ std::string Filled(std::string text, const std::string& value) {
 std::string SignalParameters(const EventInfo& event) {
     std::string text;
     for (const Parameter& parameter : event.parameters.All())
-        text += (text.empty() ? "" : ", ") + StorageOf(parameter.type) + "& " + Lower(parameter.name);
+        text += (text.empty() ? "" : ", ") + StorageOf(parameter) + "& " + Lower(parameter.name);
     return text;
 }
 
@@ -268,7 +268,7 @@ class Writer {
         for (const EventInfo* event : table_.events) {
             file << "        case " << event->number << ": emit " << Lower(event->name) << "(";
             for (std::size_t i = 0; i < event->parameters.count; ++i)
-                file << (i ? ", " : "") << "arguments[" << i << "].As<" << StorageOf(event->parameters.list[i].type) << ">()";
+                file << (i ? ", " : "") << "arguments[" << i << "].As<" << StorageOf(event->parameters.list[i]) << ">()";
             file << "); break;\n";
         }
         file << "        default: break;\n    }\n}\n";

@@ -39,7 +39,7 @@ TEST_F(FolderViewFailure, AFolderThatCannotBeReadHasNoChildrenAndGivesNoError) {
     }
     EXPECT_EQ(Labels(view), "x {a {s}, b, c {u}}");
     EXPECT_EQ(stage.Messages(), "");
-    EXPECT_TRUE(stage.others.errors.reports.empty());
+    EXPECT_TRUE(stage.host.errors.reports.empty());
 }
 
 TEST_F(FolderViewFailure, AFolderThatCannotBeReadDoesNotStopAFillOfAll) {
@@ -105,7 +105,7 @@ TEST_F(FolderViewFailure, MyDocumentsThatCannotBeReadStandsAlone) {
 }
 
 TEST_F(FolderViewFailure, ASpecialFolderThatTheSystemLacksGivesARootWithoutAPath) {
-    headless::HeadlessHost host;
+    test::HostUnderTest host;
     host.files.SetSpecialFolder(5, "");
     auto& other = host.Create<FolderView>("FolderView1");
     other.SetPathRoot("My Documents");
@@ -137,7 +137,7 @@ TEST_F(FolderViewFailure, ErrorsOfTheApplicationWhileAddingEndNoRefresh) {
     stage.Folder("C:\\x\\new");
     stage.Tick();
     EXPECT_TRUE(stage.Has("C:\\x\\new"));
-    EXPECT_TRUE(stage.others.errors.reports.empty());
+    EXPECT_TRUE(stage.host.errors.reports.empty());
 }
 
 // The disk fails at any step
@@ -213,7 +213,7 @@ class FolderViewFailingStep : public testing::TestWithParam<Act> {
     /// No key stands twice, each node is below the folder that holds it, and the tree works as ever once the disk does.
     static void ExpectSoundAndUsable(Stage& stage) {
         FolderView& view = stage.View();
-        EXPECT_TRUE(stage.others.errors.reports.empty());
+        EXPECT_TRUE(stage.host.errors.reports.empty());
         std::set<std::string> keys;
         for (std::int32_t index = 1; index <= view.ItemCount(); ++index) {
             const child::TreeNodeRef node = stage.Tree().Nodes.Item(index);

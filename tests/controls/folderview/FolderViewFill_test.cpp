@@ -46,7 +46,7 @@ TEST_F(FolderViewFill, ABuildTellsItsStepsInOrder) {
     EXPECT_EQ(stage.Events(),
               "BeforePaint(False) BeforeAddItem(False) AfterAddItem(1) BeforeAddItem(False) AfterAddItem(2) BeforeAddItem(False) "
               "AfterAddItem(3) AfterPaint ChangedFolder");
-    EXPECT_THAT(stage.changes, ElementsAre("PathRoot"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("PathRoot"));
 }
 
 TEST_F(FolderViewFill, WhatEachStepOfABuildSees) {
@@ -55,7 +55,7 @@ TEST_F(FolderViewFill, WhatEachStepOfABuildSees) {
     std::vector<std::string> seen;
     const auto note = [&](const char* step) {
         seen.push_back(std::string(step) + ": " + Labels(view) + " / " + view.PathRoot() + " / " + view.FolderPath() + " / " +
-                       std::to_string(stage.changes.size()));
+                       std::to_string(stage.Changes().size()));
     };
     stage.handlers.On(folderview::BeforePaint, [&](bool&) { note("BeforePaint"); });
     stage.handlers.On(folderview::BeforeAddItem, [&](bool&) { note("BeforeAddItem"); });
@@ -109,7 +109,7 @@ TEST_F(FolderViewFill, ABuildThatIsCancelledLeavesTheOldTreeAndThePath) {
     EXPECT_EQ(view.FolderPath(), "C:\\x");
     EXPECT_EQ(view.PathRoot(), "C:\\y");
     EXPECT_EQ(stage.Events(), "BeforePaint(False)");
-    EXPECT_THAT(stage.changes, ElementsAre("PathRoot"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("PathRoot"));
 }
 
 TEST_F(FolderViewFill, AnEmptyRootGivesAnEmptyTreeAndIsToldAllTheSame) {
@@ -237,12 +237,11 @@ TEST_F(FolderViewFill, AFolderThatWasLeftOutIsAskedForAtTheNextFill) {
 }
 
 TEST_F(FolderViewFill, NobodyWhoListensChangesNothing) {
-    stage.unwanted = {"BeforeAddItem", "AfterAddItem", "BeforePaint", "AfterPaint", "ChangedFolder"};
-    for (const char* path : {"C:\\x\\a", "C:\\x\\b"}) stage.Folder(path);
-    view.SetPathRoot("C:\\x");
-    EXPECT_EQ(stage.Events(), "");
-    EXPECT_EQ(Labels(view), "x {a, b}");
-    EXPECT_EQ(view.FolderPath(), "C:\\x");
+    Stage unheard({.heard = false});
+    for (const char* path : {"C:\\x\\a", "C:\\x\\b"}) unheard.Folder(path);
+    unheard.View().SetPathRoot("C:\\x");
+    EXPECT_EQ(Labels(unheard.View()), "x {a, b}");
+    EXPECT_EQ(unheard.View().FolderPath(), "C:\\x");
 }
 
 // Order and doubles
@@ -431,7 +430,7 @@ TEST_F(FolderViewDesign, ABuildTouchesNothingOnTheDisk) {
         view.Show();
         EXPECT_EQ(stage.watched.calls, 0) << root;
     }
-    EXPECT_THAT(stage.asked, IsEmpty());
+    EXPECT_THAT(stage.Asked(), IsEmpty());
 }
 
 TEST_F(FolderViewDesign, ABuildIsToldAndCanBeCancelled) {

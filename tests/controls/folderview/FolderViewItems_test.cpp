@@ -46,7 +46,7 @@ TEST_F(FolderViewItems, ACursorOutOfRangeReadsBackZero) {
         view.SetItemIndex(index);
         EXPECT_EQ(view.ItemIndex(), 0) << index;
     }
-    EXPECT_EQ(stage.changes.back(), "ItemIndex");
+    EXPECT_EQ(stage.Changes().back(), "ItemIndex");
 }
 
 TEST_F(FolderViewItems, WithoutACursorAllGettersGiveEmptyValues) {
@@ -72,7 +72,7 @@ TEST_F(FolderViewItems, WithoutACursorSettersDoAndReportNothing) {
     view.SetItemIcon("no such image");
     view.SetItemSelected(true);
     view.SetItemExpanded(true);
-    EXPECT_THAT(stage.changes, IsEmpty());
+    EXPECT_THAT(stage.Changes(), IsEmpty());
     EXPECT_EQ(stage.Events(), "");
     EXPECT_EQ(Labels(view), "x {a, b, c}");
     EXPECT_EQ(stage.Selected(), "");
@@ -83,7 +83,7 @@ TEST_F(FolderViewItems, ACursorThatTheNodesHaveLeftBehindGivesEmptyValues) {
     for (const char* key : {"C:\\x\\a", "C:\\x\\b"}) stage.Tree().Nodes.Remove(Variant(key));
     EXPECT_EQ(view.ItemPath(), "");
     view.SetItemDisplayName("n");
-    EXPECT_THAT(stage.changes, IsEmpty());
+    EXPECT_THAT(stage.Changes(), IsEmpty());
 }
 
 TEST_F(FolderViewItems, ThePathIsTheKeyOfTheNode) {
@@ -98,7 +98,7 @@ TEST_F(FolderViewItems, TheTagBelongsToTheNode) {
     view.SetItemTag("mine");
     EXPECT_EQ(view.ItemTag(), "mine");
     EXPECT_EQ(stage.Node("C:\\x\\a")->Tag(), Variant("mine"));
-    EXPECT_THAT(stage.changes, ElementsAre("ItemTag"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("ItemTag"));
     On("C:\\x\\b");
     EXPECT_EQ(view.ItemTag(), "");
 }
@@ -116,14 +116,14 @@ TEST_F(FolderViewItems, TheIconIsTheImageOfTheNode) {
     view.SetItemIcon("My Folders");
     EXPECT_EQ(view.ItemIcon(), "My Folders");
     EXPECT_EQ(stage.Node("C:\\x\\a")->Image(), Variant("My Folders"));
-    EXPECT_THAT(stage.changes, ElementsAre("ItemIcon"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("ItemIcon"));
 }
 
 TEST_F(FolderViewItems, AnIconThatIsNotAmongTheImagesIsAnError) {
     On("C:\\x\\a");
     EXPECT_EQ(ErrorOf([&] { view.SetItemIcon("no such image"); }), frame::errors::elementNotFound);
     EXPECT_EQ(view.ItemIcon(), "File Folder");
-    EXPECT_THAT(stage.changes, IsEmpty());
+    EXPECT_THAT(stage.Changes(), IsEmpty());
 }
 
 TEST_F(FolderViewItems, ExpandingByTheCursorFillsTheNode) {
@@ -133,7 +133,7 @@ TEST_F(FolderViewItems, ExpandingByTheCursorFillsTheNode) {
     view.SetItemExpanded(true);
     EXPECT_TRUE(view.ItemExpanded());
     EXPECT_EQ(stage.Events(), "Expand(C:\\x\\a) BeforeAddItem(False) AfterAddItem(5)");
-    EXPECT_THAT(stage.changes, ElementsAre("ItemExpanded"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("ItemExpanded"));
     view.SetItemExpanded(false);
     EXPECT_FALSE(view.ItemExpanded());
     EXPECT_EQ(stage.Events(), "Collapse(C:\\x\\a)");
@@ -146,7 +146,7 @@ TEST_F(FolderViewItems, TheDisplayNameLeavesTheFolderAsItIs) {
     EXPECT_EQ(view.ItemName(), "a");
     EXPECT_TRUE(stage.Disk().FolderExists("C:\\x\\a"));
     EXPECT_FALSE(stage.Disk().FolderExists("C:\\x\\Label"));
-    EXPECT_THAT(stage.changes, ElementsAre("ItemDisplayName"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("ItemDisplayName"));
 }
 
 TEST_F(FolderViewItems, TheNameIsThatOfTheFolder) {
@@ -184,7 +184,7 @@ TEST_F(FolderViewItems, SettingTheNameRenamesTheFolderAndTheLabelAndKeepsTheKey)
     EXPECT_EQ(view.ItemDisplayName(), "new");
     EXPECT_EQ(view.ItemPath(), "C:\\x\\b");
     EXPECT_EQ(view.ItemName(), "");
-    EXPECT_THAT(stage.changes, ElementsAre("ItemName"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("ItemName"));
 }
 
 TEST_F(FolderViewItems, ARenamedFolderIsThrownOutByTheFirstClickOnItsParentAndComesBackByTheSecond) {
@@ -210,7 +210,7 @@ TEST_F(FolderViewItems, ANameThatIsTakenIsAnErrorAndChangesNothing) {
     EXPECT_EQ(ErrorOf([&] { view.SetItemName("b"); }), frame::errors::fileExists);
     EXPECT_EQ(view.ItemDisplayName(), "a");
     EXPECT_TRUE(stage.Disk().FolderExists("C:\\x\\a"));
-    EXPECT_THAT(stage.changes, IsEmpty());
+    EXPECT_THAT(stage.Changes(), IsEmpty());
 }
 
 TEST_F(FolderViewItems, ABadNameIsAnErrorAndChangesNothing) {
@@ -225,7 +225,7 @@ TEST_F(FolderViewItems, SettingTheNameOfWhatIsNoFolderDoesNothing) {
     stage.Remove("C:\\x\\a");
     view.SetItemName("new");
     EXPECT_EQ(view.ItemDisplayName(), "a");
-    EXPECT_THAT(stage.changes, IsEmpty());
+    EXPECT_THAT(stage.Changes(), IsEmpty());
     stage.ShowRoot("My Folders");
     view.SetItemName("new");
     EXPECT_EQ(Labels(view), "My Folders");
@@ -239,7 +239,7 @@ TEST_F(FolderViewItems, SettingSelectedToTrueSelects) {
     EXPECT_EQ(stage.Selected(), "C:\\x\\a");
     EXPECT_EQ(stage.Events(), "");
     EXPECT_EQ(view.FolderPath(), "C:\\x");
-    EXPECT_THAT(stage.changes, ElementsAre("ItemSelected"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("ItemSelected"));
 }
 
 TEST_F(FolderViewItems, SettingSelectedToFalseLeavesTheSelection) {
@@ -261,7 +261,7 @@ TEST_F(FolderViewItems, SettingSelectedItemSelectsWithoutTellingAnything) {
     EXPECT_EQ(stage.Tree().SelectedItem()->Index(), 3);
     EXPECT_EQ(stage.Events(), "");
     EXPECT_EQ(view.FolderPath(), "C:\\x");
-    EXPECT_THAT(stage.changes, ElementsAre("SelectedItem"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("SelectedItem"));
 }
 
 TEST_F(FolderViewItems, SelectedItemOutOfRangeLeavesTheSelection) {

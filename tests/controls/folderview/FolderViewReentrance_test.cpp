@@ -303,7 +303,7 @@ TEST_P(FolderViewReentrance, TheApplicationMayDoAnythingAtAnyMoment) {
                 deed.run(stage, arguments);
             });
             EXPECT_TRUE(done);
-            for (const auto& report : stage.others.errors.reports) EXPECT_EQ(report.error.Number(), applicationError);
+            for (const auto& report : stage.host.errors.reports) EXPECT_EQ(report.error.Number(), applicationError);
             ExpectSound(stage);
             ExpectUsable(stage);
         }
@@ -317,7 +317,7 @@ TEST_P(FolderViewReentrance, TheApplicationMayDestroyTheControlAtAnyMoment) {
         Prepare(stage);
         RunWith(stage, moment, [&](frame::EventArguments) { stage.Destroy(); });
         EXPECT_FALSE(stage.Lives());
-        EXPECT_TRUE(stage.others.errors.reports.empty());
+        EXPECT_TRUE(stage.host.errors.reports.empty());
     }
 }
 

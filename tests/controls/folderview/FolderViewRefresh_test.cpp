@@ -29,7 +29,7 @@ TEST_F(FolderViewRefresh, ARefreshOfWhatHasNotChangedTellsNothing) {
     view.Refresh();
     EXPECT_EQ(stage.Events(), "");
     EXPECT_EQ(Labels(view), "x {a, b}");
-    EXPECT_THAT(stage.changes, IsEmpty());
+    EXPECT_THAT(stage.Changes(), IsEmpty());
 }
 
 TEST_F(FolderViewRefresh, ANewFolderComesUnderANodeInView) {
@@ -189,21 +189,21 @@ TEST_F(FolderViewRefresh, AnEmptyTreeStaysEmpty) {
 TEST_F(FolderViewRefresh, TheTimerRefreshesAtItsInterval) {
     view.SetRefreshInterval(1000);
     stage.Folder("C:\\x\\new");
-    stage.others.clock.Advance(999);
+    stage.host.clock.Advance(999);
     EXPECT_EQ(stage.Events(), "");
-    stage.others.clock.Advance(1);
+    stage.host.clock.Advance(1);
     EXPECT_EQ(stage.Events(), "BeforeAddItem(False) AfterAddItem(4)");
     stage.Folder("C:\\x\\newer");
-    stage.others.clock.Advance(1000);
+    stage.host.clock.Advance(1000);
     EXPECT_EQ(stage.Events(), "BeforeAddItem(False) AfterAddItem(5)");
-    EXPECT_THAT(stage.changes, ElementsAre("RefreshInterval"));
+    EXPECT_THAT(stage.Changes(), ElementsAre("RefreshInterval"));
 }
 
 TEST_F(FolderViewRefresh, AnIntervalOfZeroMeansNoRefreshes) {
     view.SetRefreshInterval(1000);
     view.SetRefreshInterval(0);
     stage.Folder("C:\\x\\new");
-    stage.others.clock.Advance(100'000);
+    stage.host.clock.Advance(100'000);
     EXPECT_EQ(stage.Events(), "");
 }
 
@@ -211,7 +211,7 @@ TEST_F(FolderViewRefresh, ALoadedIntervalRefreshes) {
     const frame::MemoryBag bag(frame::MemoryBag::Contents{{"PathRoot", Variant("C:\\Temp")}, {"RefreshInterval", Variant(500)}});
     Stage loaded({.saved = &bag});
     loaded.Folder("C:\\Temp\\new");
-    loaded.others.clock.Advance(500);
+    loaded.host.clock.Advance(500);
     EXPECT_EQ(loaded.Events(), "BeforeAddItem(False) AfterAddItem(2)");
 }
 

@@ -46,7 +46,7 @@ TEST(FolderViewTables, RunTimePropertiesAreRefusedAtDesignTime) {
         stage.View().SetPathRoot("C:\\Temp");
         stage.Clear();
         EXPECT_EQ(ErrorOf([&] { stage.View().Put(property.name, property.value); }), frame::errors::notPermitted) << property.name;
-        EXPECT_THAT(stage.changes, IsEmpty()) << property.name;
+        EXPECT_THAT(stage.Changes(), IsEmpty()) << property.name;
     }
 }
 
@@ -55,9 +55,9 @@ TEST(FolderViewTables, RunTimePropertiesReportAtRunTime) {
         Stage stage;
         stage.ShowRoot("C:\\Temp");
         stage.View().SetItemIndex(1);
-        stage.changes.clear();
+        stage.Changes();
         EXPECT_EQ(ErrorOf([&] { stage.View().Put(property.name, property.value); }), 0) << property.name;
-        EXPECT_THAT(stage.changes, ElementsAre(property.name)) << property.name;
+        EXPECT_THAT(stage.Changes(), ElementsAre(property.name)) << property.name;
     }
 }
 
@@ -66,7 +66,7 @@ TEST(FolderViewTables, ReadOnlyPropertiesRefuseAlways) {
         Stage run, design({.designTime = true});
         EXPECT_EQ(ErrorOf([&] { run.View().Put(name, 1); }), frame::errors::notAtRunTime) << name;
         EXPECT_EQ(ErrorOf([&] { design.View().Put(name, 1); }), frame::errors::notPermitted) << name;
-        EXPECT_THAT(run.changes, IsEmpty()) << name;
+        EXPECT_THAT(run.Changes(), IsEmpty()) << name;
     }
 }
 
@@ -91,7 +91,7 @@ TEST(FolderViewTables, EveryOtherPropertyIsSetAtDesignTimeAndAtRunTime) {
             Stage stage({.designTime = designTime});
             stage.View().Put(name, value);
             EXPECT_EQ(stage.View().Get(name), value) << name;
-            EXPECT_THAT(stage.changes, ElementsAre(name)) << name;
+            EXPECT_THAT(stage.Changes(), ElementsAre(name)) << name;
         }
 }
 
@@ -474,7 +474,7 @@ TEST(FolderViewTables, StockPropertiesAreThoseOfTheTree) {
     EXPECT_EQ(tree.ForeColor(), frame::OLE_COLOR(255));
     EXPECT_TRUE(tree.FullRowSelect());
     EXPECT_TRUE(tree.HotTracking());
-    EXPECT_THAT(stage.changes,
+    EXPECT_THAT(stage.Changes(),
                 ElementsAre("Enabled", "BorderStyle", "Appearance", "MousePointer", "ForeColor", "FullRowSelect", "HotTracking"));
     const auto font = std::make_shared<frame::Font>();
     view.SetFont(font);

@@ -7,7 +7,7 @@
 #include "frame/Text.h"
 #include "tests/ErrorOf.h"
 #include "tests/controls/fileview/FileViewTestHelp.h"
-#include "tests/controls/fileview/disk/RealDisk.h"
+#include "tests/hosts/RealDisk.h"
 
 /// What holds of the list on every file system.
 namespace tessel::controls {
@@ -67,7 +67,7 @@ class FileViewOnAnyDisk : public testing::TestWithParam<Disk> {
     }
 
   protected:
-    std::unique_ptr<RealDisk> real_ = GetParam() == Disk::Real ? std::make_unique<RealDisk>() : nullptr;
+    std::unique_ptr<test::RealDisk> real_ = GetParam() == Disk::Real ? std::make_unique<test::RealDisk>() : nullptr;
 
   private:
     std::string root_ = real_ ? real_->folder / "x" : "C:\\x";

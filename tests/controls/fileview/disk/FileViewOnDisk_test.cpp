@@ -11,7 +11,7 @@
 
 #include "frame/Text.h"
 #include "tests/controls/fileview/FileViewTestHelp.h"
-#include "tests/controls/fileview/disk/RealDisk.h"
+#include "tests/hosts/RealDisk.h"
 
 /// The list over the disk of this machine: what no other file system has.
 namespace tessel::controls {
@@ -33,7 +33,7 @@ class FileViewOnDisk : public testing::Test {
     std::string Sub(std::int32_t index, int column) { return SubItem(view, index, column); }
     bool IsFolderRow(std::int32_t index) { return Sub(index, 12).starts_with(' '); }
 
-    RealDisk real;
+    test::RealDisk real;
     test::TestFolder& folder = real.folder;
     Stage stage{{.files = &real.files}};
     FileView& view = stage.View();
