@@ -9,8 +9,8 @@
 #include "frame/ChildControl.h"
 #include "frame/ClassTable.h"
 #include "frame/Event.h"
+#include "frame/OwnSurface.h"
 #include "frame/Site.h"
-#include "frame/Surface.h"
 #include "frame/host.h"
 
 namespace tessel::frame {

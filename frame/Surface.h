@@ -12,8 +12,6 @@
 
 namespace tessel::frame {
 
-class Control;
-
 /// The units of a surface.
 enum class ScaleModeConstants : std::int16_t {
     User = 0,
@@ -127,43 +125,6 @@ class DrawingSurface {
     OLE_COLOR backColor_ = colors::buttonFace;
     OLE_COLOR foreColor_ = colors::buttonText;
     FontHolder font_{[this] { LookChanged(); }};
-};
-
-/// The surface that a control itself is.
-class OwnSurface final : public DrawingSurface {
-  public:
-    explicit OwnSurface(Control& control);
-
-    /// The control's size in twips, held by its site; a set leads to `Resize`. 0 once the host has let go.
-    float Width() const;
-    void SetWidth(float value);
-    float Height() const;
-    void SetHeight(float value);
-
-    bool Enabled() const { return enabled_; }
-    void SetEnabled(bool value);
-    std::int16_t MousePointer() const { return mousePointer_; }
-    void SetMousePointer(std::int16_t value);
-    const PictureRef& MouseIcon() const { return mouseIcon_; }
-    void SetMouseIcon(const PictureRef& value);
-    std::int16_t Appearance() const { return appearance_; }
-    void SetAppearance(std::int16_t value);
-    std::int16_t BorderStyle() const { return borderStyle_; }
-    void SetBorderStyle(std::int16_t value);
-    const PictureRef& Picture() const { return picture_; }
-    void SetPicture(const PictureRef& value);
-    /// Asks the host to show the surface anew.
-    void Refresh();
-
-  protected:
-    TextSize InnerSize() const override;
-    void LookChanged() override;
-
-  private:
-    Control& control_;
-    bool enabled_ = true;
-    std::int16_t mousePointer_ = 0, appearance_ = 1, borderStyle_ = 0;
-    PictureRef mouseIcon_, picture_;
 };
 
 /// Two pixels on each side where a border is drawn.

@@ -1,0 +1,61 @@
+#include "frame/OwnSurface.h"
+
+#include "frame/Control.h"
+
+namespace tessel::frame {
+
+OwnSurface::OwnSurface(Control& control) : DrawingSurface(control.Host()), control_(control) {}
+
+float OwnSurface::Width() const { return control_.Site() ? control_.Site()->Width() : 0; }
+float OwnSurface::Height() const { return control_.Site() ? control_.Site()->Height() : 0; }
+
+void OwnSurface::SetWidth(float value) {
+    if (Site* site = control_.Site()) site->SetSize(value, site->Height());
+}
+
+void OwnSurface::SetHeight(float value) {
+    if (Site* site = control_.Site()) site->SetSize(site->Width(), value);
+}
+
+void OwnSurface::SetEnabled(bool value) {
+    enabled_ = value;
+    LookChanged();
+}
+
+void OwnSurface::SetMousePointer(std::int16_t value) {
+    mousePointer_ = value;
+    LookChanged();
+}
+
+void OwnSurface::SetMouseIcon(const PictureRef& value) {
+    mouseIcon_ = value;
+    LookChanged();
+}
+
+void OwnSurface::SetAppearance(std::int16_t value) {
+    appearance_ = value;
+    LookChanged();
+}
+
+void OwnSurface::SetBorderStyle(std::int16_t value) {
+    borderStyle_ = value;
+    LookChanged();
+}
+
+void OwnSurface::SetPicture(const PictureRef& value) {
+    picture_ = value;
+    LookChanged();
+}
+
+void OwnSurface::Refresh() { LookChanged(); }
+
+TextSize OwnSurface::InnerSize() const {
+    const float border = borderStyle_ != 0 ? 2 * borderTwips : 0;
+    return {Width() > border ? Width() - border : 0, Height() > border ? Height() - border : 0};
+}
+
+void OwnSurface::LookChanged() {
+    if (Site* site = control_.Site()) site->Repaint();
+}
+
+}  // namespace tessel::frame
