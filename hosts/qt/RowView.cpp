@@ -154,6 +154,8 @@ int RowView::SidewaysStep() const {
 void RowView::LayOut() {
     if (!Child()) return;
     const QScopedValueRollback following(following_, true);
+    const bool keepsFocus = size() == laidOutFor_ && IsFocusInView();
+    laidOutFor_ = size();
     FitCells();
     // A bar that comes takes room, and may make the other one come.
     constexpr int rounds = 3;
@@ -168,7 +170,18 @@ void RowView::LayOut() {
         horizontalScrollBar()->setRange(0, limit.x());
         if (layout_.window == viewport()->size()) break;
     }
+    if (keepsFocus) MakeFocusVisible();
     if (editor_) PlaceEditor();
+}
+
+void RowView::MakeFocusVisible() {
+    const auto row = FocusPosition();
+    if (row && *row < layout_.count) Scroll(layout_.IntoView(*row, Scrolled()));
+}
+
+bool RowView::IsFocusInView() const {
+    const auto row = FocusPosition();
+    return row && *row < layout_.count && layout_.IntoView(*row, Scrolled()) == Scrolled();
 }
 
 void RowView::resizeEvent(QResizeEvent* event) {

@@ -152,8 +152,12 @@ class RowView : public QAbstractItemView {
     void RememberSeen();
     /// The first row that is seen as a whole, as `Follow` began; 0 for none.
     RowKey FirstSeen() const { return seen_.empty() ? 0 : seen_.front().row; }
-    /// Cells, contents and window into `layout_`, scroll bars by it.
+    /// Cells, contents and window into `layout_`, scroll bars by it. A row with the focus that was in view is not covered by a bar
+    /// that comes.
     virtual void LayOut();
+    /// As a whole, in the window of the last layout.
+    bool IsFocusInView() const;
+    void MakeFocusVisible();
     virtual void FitCells() = 0;
     virtual int SidewaysStep() const;
     void UpdateRows(Position first, Position count);
@@ -235,6 +239,7 @@ class RowView : public QAbstractItemView {
     void dropEvent(QDropEvent* event) override;
 
     ListLayout layout_;
+    QSize laidOutFor_;  // the view's size at that time
     Look look_;
     bool following_ = false;  // scrolling is not the user's
     std::optional<Position> hot_;

@@ -141,6 +141,22 @@ TEST(TreeViewPeer, LabelsWiderThanTheWindowAreScrolledTo) {
     EXPECT_FALSE(screen.view().horizontalScrollBar()->isVisible());
 }
 
+TEST(TreeViewPeer, AScrollBarThatComesDoesNotCoverTheSelection) {
+    TreeOnScreen screen;
+    for (int i = 0; i < 40; ++i) screen.Add("node " + std::to_string(i));
+    screen.Settle();
+    screen.tree.EnsureVisible(screen.Node("node 25"));
+    screen.tree.SetSelectedItem(screen.tree.NodeOf(screen.Node("node 25")));
+    screen.Settle();
+    const int height = screen.port()->height();
+    ASSERT_LE(screen.CellOf("node 25").bottom(), screen.port()->rect().bottom());
+    screen.tree.NodeOf(screen.Node("node 20"))->SetText(std::string(80, 'm'));
+    screen.Settle();
+    QCoreApplication::processEvents();
+    ASSERT_LT(screen.port()->height(), height);
+    EXPECT_LE(screen.CellOf("node 25").bottom(), screen.port()->rect().bottom());
+}
+
 TEST(TreeViewPeer, TheKeysBringADeepLabelIntoViewSideways) {
     TreeOnScreen screen(160, 400);
     NodeId parent = noNode;
