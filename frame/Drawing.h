@@ -9,12 +9,11 @@
 #include <vector>
 
 #include "frame/Color.h"
+#include "frame/Picture.h"
 
 /// Drawing as data: a surface hands each operation on as one of these plain structs, in the surface's own units,
 /// to whatever records it, rasters it or paints it.
 namespace tessel::frame {
-
-class Picture;
 
 namespace draw {
 
@@ -113,6 +112,18 @@ class Canvas {
     virtual ~Canvas() = default;
     /// One operation in the surface's own units. `background` and `foreground` are the surface's colours, as RGB.
     virtual void Draw(const DrawOp& op, const Pen& pen, const Scale& scale, OLE_COLOR background, OLE_COLOR foreground) = 0;
+    /// What was drawn has gone: the surface has another background (RGB), or another picture or none behind the drawing, which is
+    /// what shows from now on, and where `Cls` clears.
+    virtual void Wipe(OLE_COLOR /*background*/, const PictureRef& /*picture*/) {}
+    /// The inside of the surface has this size, in pixels at scale 1. What is drawn stays, and beside it the background comes.
+    virtual void Resize(int /*width*/, int /*height*/, OLE_COLOR /*background*/) {}
+
+    /// Whether the canvas keeps the pixels of what was drawn, and answers what follows.
+    virtual bool KeepsPixels() const { return false; }
+    /// RGB of a pixel at scale 1; nothing outside.
+    virtual std::optional<OLE_COLOR> Pixel(int /*x*/, int /*y*/) const { return {}; }
+    /// What shows: a plane of scale 1, and one of the screen's scale where that is another.
+    virtual std::vector<PixelPlane> Planes() const { return {}; }
 };
 
 /// Keeps the operations in their order, for tests and logs.

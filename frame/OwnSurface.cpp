@@ -44,6 +44,7 @@ void OwnSurface::SetBorderStyle(std::int16_t value) {
 
 void OwnSurface::SetPicture(const PictureRef& value) {
     picture_ = value;
+    Wipe(value);
     LookChanged();
 }
 

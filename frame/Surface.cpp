@@ -71,6 +71,11 @@ void DrawingSurface::PaintPicture(const PictureRef& picture, float x, float y) {
     Emit(draw::PaintPicture{x, y, picture});
 }
 
+TextSize DrawingSurface::UnitsAt(float xTwips, float yTwips) const {
+    const TextSize unit = TwipsPerUnit();
+    return {scaleLeft_ + xTwips / unit.width, scaleTop_ + yTwips / unit.height};
+}
+
 float DrawingSurface::TextWidth(const std::string& text) const {
     return host_.Metrics().Measure(*Font(), text).width / TwipsPerUnit().width;
 }
@@ -155,7 +160,7 @@ void DrawingSurface::SetScaleHeight(float value) {
 void DrawingSurface::SetBackColor(OLE_COLOR value) {
     if (value == backColor_) return;
     backColor_ = value;
-    Wiped();
+    Wipe(behind_);
     LookChanged();
 }
 
@@ -170,10 +175,30 @@ void DrawingSurface::SetFont(const FontRef& value) {
     LookChanged();
 }
 
+void DrawingSurface::AddCanvas(Canvas& canvas) {
+    canvases_.push_back(&canvas);
+    TellSize(canvas);
+    canvas.Wipe(Background(), behind_);
+}
+
 void DrawingSurface::AddCanvas(std::unique_ptr<Canvas> canvas) {
     if (!canvas) return;
-    canvases_.push_back(canvas.get());
+    AddCanvas(*canvas);
     ownCanvases_.push_back(std::move(canvas));
+}
+
+void DrawingSurface::Wipe(const PictureRef& picture) {
+    behind_ = picture;
+    for (Canvas* canvas : canvases_) canvas->Wipe(Background(), behind_);
+}
+
+void DrawingSurface::Resized() {
+    for (Canvas* canvas : canvases_) TellSize(*canvas);
+}
+
+void DrawingSurface::TellSize(Canvas& canvas) const {
+    const TextSize inner = InnerSize();
+    canvas.Resize(PixelAt(inner.width / twipsPerPixel), PixelAt(inner.height / twipsPerPixel), Background());
 }
 
 Scale DrawingSurface::PixelScale() const {
@@ -184,7 +209,7 @@ Scale DrawingSurface::PixelScale() const {
 void DrawingSurface::Emit(const DrawOp& op) {
     if (canvases_.empty()) return;
     const Scale scale = PixelScale();
-    const OLE_COLOR background = OleTranslateColor(backColor_, host_.Colors());
+    const OLE_COLOR background = Background();
     const OLE_COLOR foreground = OleTranslateColor(foreColor_, host_.Colors());
     for (Canvas* canvas : canvases_) canvas->Draw(op, pen_, scale, background, foreground);
 }

@@ -51,6 +51,8 @@ class DrawingSurface {
     /// Paints a picture at its natural size.
     void PaintPicture(const PictureRef& picture, float x, float y);
 
+    /// The place in the surface's units of a place in twips from the corner of its inside.
+    TextSize UnitsAt(float xTwips, float yTwips) const;
     float TextWidth(const std::string& text) const;
     float TextHeight(const std::string& text) const;
 
@@ -89,8 +91,12 @@ class DrawingSurface {
     const FontRef& Font() const { return font_.Get(); }
     void SetFont(const FontRef& value);
 
-    /// A canvas that gets every operation from now on. It must be there for as long as something is drawn.
-    void AddCanvas(Canvas& canvas) { canvases_.push_back(&canvas); }
+    /// Those behind the system colours that it is drawn in.
+    const SystemColors& Colors() const { return host_.Colors(); }
+
+    /// A canvas that gets every operation from now on, after it has been told the size and the background. It must be there for as
+    /// long as something is drawn.
+    void AddCanvas(Canvas& canvas);
     void RemoveCanvas(Canvas& canvas) { std::erase(canvases_, &canvas); }
     /// The same for a canvas that lives as long as the surface; null is none.
     void AddCanvas(std::unique_ptr<Canvas> canvas);
@@ -100,8 +106,12 @@ class DrawingSurface {
     virtual TextSize InnerSize() const = 0;
     /// RGB of a pixel, where the surface keeps pixels.
     virtual std::optional<OLE_COLOR> PixelOf(int /*x*/, int /*y*/) const { return std::nullopt; }
-    /// A new background has wiped what was drawn.
-    virtual void Wiped() {}
+    /// The surface has this picture behind the drawing from now on, or none; what was drawn is wiped.
+    void Wipe(const PictureRef& picture);
+    /// The picture behind the drawing.
+    const PictureRef& Behind() const { return behind_; }
+    /// Tells every canvas the inner size.
+    void Resized();
     /// Something of the surface's look has changed.
     virtual void LookChanged() {}
     /// How this surface's units become pixels at scale 1.
@@ -114,6 +124,8 @@ class DrawingSurface {
 
   private:
     void Emit(const DrawOp& op);
+    void TellSize(Canvas& canvas) const;
+    OLE_COLOR Background() const { return OleTranslateColor(backColor_, host_.Colors()); }
 
     Host& host_;
     std::vector<Canvas*> canvases_;
@@ -124,6 +136,7 @@ class DrawingSurface {
     float currentX_ = 0, currentY_ = 0;
     OLE_COLOR backColor_ = colors::buttonFace;
     OLE_COLOR foreColor_ = colors::buttonText;
+    PictureRef behind_;
     FontHolder font_{[this] { LookChanged(); }};
 };
 

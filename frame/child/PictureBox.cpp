@@ -2,62 +2,44 @@
 
 #include "frame/ClassTable.h"
 #include "frame/Control.h"
+#include "frame/child/Raster.h"
 
 namespace tessel::child {
 
-using frame::twipsPerPixel;
-
-PictureBox::PictureBox(frame::Control& owner, std::string name)
-    : KeyChild(owner, std::move(name)), DrawingSurface(owner.Host()), raster_(0, 0, BackColor()) {
-    AddCanvas(raster_);
-    AddCanvas(owner.Host().Peers().MakeCanvas(*this, *this));
+PictureBox::PictureBox(frame::Control& owner, std::string name) : KeyChild(owner, std::move(name)), DrawingSurface(owner.Host()) {
+    std::unique_ptr<frame::Canvas> screen = owner.Host().Peers().MakeCanvas(*this, *this);
+    pixels_ = screen && screen->KeepsPixels() ? screen.get() : nullptr;
+    AddCanvas(std::move(screen));
+    if (pixels_) return;
+    auto raster = std::make_unique<Raster>(0, 0, BackColor());
+    pixels_ = raster.get();
+    AddCanvas(std::move(raster));
 }
 
 void PictureBox::SetPicture(const frame::PictureRef& value) {
-    picture_ = value;
+    Wipe(value);
     FitPicture();
-    Wiped();
     Changed();
 }
 
-frame::PictureRef PictureBox::Image() const {
-    constexpr std::uint32_t opaque = 0xFF000000u;
-    frame::PixelPlane plane{1, raster_.Width(), raster_.Height(), {}};
-    plane.pixels.reserve(static_cast<std::size_t>(plane.width) * static_cast<std::size_t>(plane.height));
-    for (int y = 0; y < plane.height; ++y)
-        for (int x = 0; x < plane.width; ++x) plane.pixels.push_back(opaque | raster_.Pixel(x, y)->value);
-    return std::make_shared<frame::Picture>(std::vector{std::move(plane)}, "");
-}
+frame::PictureRef PictureBox::Image() const { return std::make_shared<frame::Picture>(pixels_->Planes(), ""); }
 
 void PictureBox::SetAutoSize(bool value) {
     if (Store(autoSize_, value)) FitPicture();
 }
 
 void PictureBox::SetBorderStyle(std::int16_t value) {
-    if (Store(borderStyle_, value)) Moved();
+    if (Store(borderStyle_, value)) Resized();
 }
 
 frame::TextSize PictureBox::InnerSize() const {
     return {Width() > Border() ? Width() - Border() : 0, Height() > Border() ? Height() - Border() : 0};
 }
 
-std::optional<frame::OLE_COLOR> PictureBox::PixelOf(int x, int y) const { return raster_.Pixel(x, y); }
-
-void PictureBox::Wiped() {
-    const frame::Scale pixels;
-    raster_.Draw(frame::draw::Cls{}, {}, pixels, Background(), 0);
-    if (picture_) raster_.Draw(frame::draw::PaintPicture{0, 0, picture_}, {}, pixels, Background(), 0);
-}
-
-void PictureBox::Moved() {
-    const frame::TextSize inner = InnerSize();
-    raster_.Resize(frame::PixelAt(inner.width / twipsPerPixel), frame::PixelAt(inner.height / twipsPerPixel), Background());
-}
-
-frame::OLE_COLOR PictureBox::Background() const { return OleTranslateColor(BackColor(), SurfaceHost().Colors()); }
+std::optional<frame::OLE_COLOR> PictureBox::PixelOf(int x, int y) const { return pixels_->Pixel(x, y); }
 
 void PictureBox::FitPicture() {
-    if (autoSize_ && picture_) Move(Left(), Top(), picture_->Width() + Border(), picture_->Height() + Border());
+    if (autoSize_ && Behind()) Move(Left(), Top(), Behind()->Width() + Border(), Behind()->Height() + Border());
 }
 
 namespace {

@@ -2,21 +2,23 @@
 
 #include "frame/Surface.h"
 #include "frame/child/PointerChild.h"
-#include "frame/child/Raster.h"
 
 namespace tessel::child {
 
 /// A box that is drawn on and that keeps what was drawn: its pixels at scale 1 can be read back with `Point`, and `Image` gives
-/// them as a picture. Its size is in its owner's twips, its inside in its own scale.
+/// them as a picture. They are those of the screen's canvas where that keeps them, printed text among them; else those of a raster
+/// of its own, where text leaves none. Its size is in its owner's twips, its inside in its own scale.
 class PictureBox final : public KeyChild, public frame::DrawingSurface {
   public:
     PictureBox(frame::Control& owner, std::string name);
 
     /// The picture behind what is drawn. A new one, or none, clears the drawing; with `AutoSize` the box takes its size.
-    const frame::PictureRef& Picture() const { return picture_; }
+    const frame::PictureRef& Picture() const { return Behind(); }
     void SetPicture(const frame::PictureRef& value);
     /// What the box shows, as a picture of its own.
     frame::PictureRef Image() const;
+    /// The canvas that keeps what was drawn.
+    const frame::Canvas& Drawn() const { return *pixels_; }
     bool AutoSize() const { return autoSize_; }
     void SetAutoSize(bool value);
     /// 0 none, any other number a border of two pixels on each side.
@@ -30,17 +32,14 @@ class PictureBox final : public KeyChild, public frame::DrawingSurface {
   protected:
     frame::TextSize InnerSize() const override;
     std::optional<frame::OLE_COLOR> PixelOf(int x, int y) const override;
-    void Wiped() override;
     void LookChanged() override { Changed(); }
-    void Moved() override;
+    void Moved() override { Resized(); }
 
   private:
     float Border() const { return borderStyle_ != 0 ? 2 * frame::borderTwips : 0; }
-    frame::OLE_COLOR Background() const;
     void FitPicture();
 
-    Raster raster_;
-    frame::PictureRef picture_;
+    const frame::Canvas* pixels_;  // that are read back: the screen's, or a raster
     bool autoSize_ = false;
     std::int16_t borderStyle_ = 1, mousePointer_ = 0;
 };

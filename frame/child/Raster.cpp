@@ -4,8 +4,6 @@
 #include <cmath>
 #include <utility>
 
-#include "frame/Picture.h"
-
 namespace tessel::child {
 
 using frame::OLE_COLOR;
@@ -17,19 +15,27 @@ namespace draw = frame::draw;
 namespace {
 
 constexpr std::uint32_t white = 0xFFFFFF;
+constexpr std::uint32_t opaque = 0xFF000000u;
 constexpr int nop = 11;
 constexpr int whiteness = 16;
 constexpr int maximumPenWidth = 32'767;
 /// In pixels. Larger circles are drawn with this radius, so that no coordinate overflows.
 constexpr double maximumRadius = 16'777'216;
 
-std::uint32_t RgbOf(OLE_COLOR color) { return frame::OleTranslateColor(color, frame::ClassicColors()).value & white; }
+/// A colour as a pixel.
+std::uint32_t PixelOf(OLE_COLOR color) { return frame::OleTranslateColor(color, frame::ClassicColors()).value | opaque; }
 
 int WidthOf(const Pen& pen) { return std::clamp(pen.width, 1, maximumPenWidth); }
 
 raster::Dashes DashesOf(const Pen& pen) { return raster::Dashes(WidthOf(pen) == 1 ? pen.style : draw::solid); }
 
 raster::Point PointAt(const Scale& scale, float x, float y) { return {PixelAt(scale.X(x)), PixelAt(scale.Y(y))}; }
+
+/// The pixel before the last one of a straight line.
+raster::Point StepBack(raster::Point last, raster::Point first) {
+    const auto back = [](int at, int to) { return at == to ? at : at + (to > at ? 1 : -1); };
+    return {back(last.x, first.x), back(last.y, first.y)};
+}
 
 std::optional<raster::Ellipse> EllipseOf(const draw::Circle& circle, const Scale& scale) {
     const double longer = static_cast<double>(circle.radius) * std::abs(scale.factorX);
@@ -57,31 +63,40 @@ void Raster::Resize(int width, int height, OLE_COLOR background) {
     height = std::clamp(height, 0, width > 0 ? std::min(maximumSide, maximumPixels / width) : maximumSide);
     if (width == columns && height == rows) return;
 
-    std::vector<std::uint32_t> resized(static_cast<std::size_t>(width) * static_cast<std::size_t>(height), RgbOf(background));
-    for (int y = 0; y < std::min(height, rows); ++y) {
-        const auto from = pixels.begin() + static_cast<std::ptrdiff_t>(IndexOf(0, y));
-        std::copy_n(from, std::min(width, columns), resized.begin() + static_cast<std::ptrdiff_t>(y) * width);
+    const std::vector<std::uint32_t> before = std::exchange(
+        pixels,
+        std::vector<std::uint32_t>(static_cast<std::size_t>(width) * static_cast<std::size_t>(height), PixelOf(background)));
+    const int columnsBefore = std::exchange(columns, width), rowsBefore = std::exchange(rows, height);
+    DrawPicture(behind.get(), {});
+    for (int y = 0; y < std::min(rows, rowsBefore); ++y) {
+        const auto from = before.begin() + static_cast<std::ptrdiff_t>(y) * columnsBefore;
+        std::copy_n(from, std::min(columns, columnsBefore), pixels.begin() + static_cast<std::ptrdiff_t>(IndexOf(0, y)));
     }
-    pixels = std::move(resized);
-    columns = width;
-    rows = height;
 }
 
 std::optional<OLE_COLOR> Raster::Pixel(int x, int y) const {
     if (!Contains(x, y)) return {};
-    return OLE_COLOR(pixels[IndexOf(x, y)]);
+    return OLE_COLOR(pixels[IndexOf(x, y)] & white);
 }
 
 void Raster::SetPixel(int x, int y, OLE_COLOR color) {
-    if (Contains(x, y)) pixels[IndexOf(x, y)] = RgbOf(color);
+    if (Contains(x, y)) pixels[IndexOf(x, y)] = PixelOf(color);
 }
 
+std::vector<frame::PixelPlane> Raster::Planes() const { return {frame::PixelPlane{1, columns, rows, pixels}}; }
+
 void Raster::Draw(const frame::DrawOp& op, const Pen& pen, const Scale& scale, OLE_COLOR background, OLE_COLOR) {
-    if (std::holds_alternative<draw::Cls>(op)) std::fill(pixels.begin(), pixels.end(), RgbOf(background));
+    if (std::holds_alternative<draw::Cls>(op)) Clear(background);
     if (const auto* line = std::get_if<draw::Line>(&op)) DrawLine(*line, pen, scale);
     if (const auto* circle = std::get_if<draw::Circle>(&op)) DrawCircle(*circle, pen, scale);
     if (const auto* dot = std::get_if<draw::PSet>(&op)) DrawDot(*dot, pen, scale);
-    if (const auto* picture = std::get_if<draw::PaintPicture>(&op)) DrawPicture(*picture, scale);
+    if (const auto* picture = std::get_if<draw::PaintPicture>(&op))
+        DrawPicture(picture->picture.get(), PointAt(scale, picture->x, picture->y));
+}
+
+void Raster::Wipe(OLE_COLOR background, const frame::PictureRef& picture) {
+    behind = picture;
+    Clear(background);
 }
 
 void Raster::Blit(int x, int y, const Raster& source, const raster::Area& part, std::optional<OLE_COLOR> mask) {
@@ -93,7 +108,7 @@ void Raster::Blit(int x, int y, const Raster& source, const raster::Area& part, 
     for (std::int64_t row = along.begin; row < along.end; ++row) {
         for (std::int64_t column = across.begin; column < across.end; ++column) {
             const std::uint32_t pixel = source.pixels[source.IndexOf(static_cast<int>(column), static_cast<int>(row))];
-            if (mask && pixel == RgbOf(*mask)) continue;
+            if (mask && pixel == PixelOf(*mask)) continue;
             pixels[IndexOf(static_cast<int>(column + right), static_cast<int>(row + down))] = pixel;
         }
     }
@@ -102,17 +117,17 @@ void Raster::Blit(int x, int y, const Raster& source, const raster::Area& part, 
 Raster::Ink Raster::InkOf(int mode, OLE_COLOR color) {
     switch (mode) {
         case draw::blackness:
-            return {0, 0};
+            return {0, opaque};
         case draw::invert:
-            return {white, white};
+            return {opaque | white, white};
         case draw::xorPen:
-            return {white, RgbOf(color)};
+            return {opaque | white, PixelOf(color) & white};
         case nop:
-            return {white, 0};
+            return {opaque | white, 0};
         case whiteness:
-            return {0, white};
+            return {0, opaque | white};
         default:
-            return {0, RgbOf(color)};
+            return {0, PixelOf(color)};
     }
 }
 
@@ -121,6 +136,12 @@ void Raster::DrawLine(const draw::Line& line, const Pen& pen, const Scale& scale
     const raster::Point to = PointAt(scale, line.x2, line.y2);
     const bool outlined = pen.style != draw::transparent;
     const int width = outlined ? WidthOf(pen) : 1;
+    const bool straight = line.box == draw::Box::None && (from.x == to.x || from.y == to.y);
+    if (outlined && (straight || line.box == draw::Box::Filled) && DashesOf(pen).IsSolid()) {
+        if (straight && from == to) return;
+        const raster::Point last = straight && width == 1 ? StepBack(to, from) : to;
+        return Stroke(raster::BrushedBoxRuns(from, last, width, Whole()), 1, InkOf(pen.mode, line.color));
+    }
     const raster::Area reach = Reach(width);
 
     raster::Runs runs;
@@ -152,17 +173,21 @@ void Raster::DrawDot(const draw::PSet& dot, const Pen& pen, const Scale& scale) 
     Stroke({{pixel.y, pixel.x, pixel.x}}, WidthOf(pen), InkOf(pen.mode, dot.color));
 }
 
-void Raster::DrawPicture(const draw::PaintPicture& picture, const Scale& scale) {
-    const frame::PixelPlane* plane = picture.picture ? picture.picture->Plane(1) : nullptr;
+void Raster::Clear(OLE_COLOR background) {
+    std::fill(pixels.begin(), pixels.end(), PixelOf(background));
+    DrawPicture(behind.get(), {});
+}
+
+void Raster::DrawPicture(const frame::Picture* picture, raster::Point at) {
+    const frame::PixelPlane* plane = picture ? picture->Plane(1) : nullptr;
     if (!plane) return;
-    constexpr std::uint32_t halfOpaque = 0x80000000u, rgb = 0xFFFFFF;
-    const raster::Point at = PointAt(scale, picture.x, picture.y);
+    constexpr std::uint32_t halfOpaque = 0x80000000u;
     const Range across = Visible(0, plane->width, plane->width, at.x, columns);
     const Range along = Visible(0, plane->height, plane->height, at.y, rows);
     for (std::int64_t row = along.begin; row < along.end; ++row) {
         for (std::int64_t column = across.begin; column < across.end; ++column) {
             const std::uint32_t pixel = plane->pixels[static_cast<std::size_t>(row * plane->width + column)];
-            if (pixel & halfOpaque) pixels[IndexOf(static_cast<int>(column + at.x), static_cast<int>(row + at.y))] = pixel & rgb;
+            if (pixel & halfOpaque) pixels[IndexOf(static_cast<int>(column + at.x), static_cast<int>(row + at.y))] = pixel | opaque;
         }
     }
 }
@@ -172,6 +197,11 @@ void Raster::Stroke(raster::Runs runs, int penWidth, Ink ink) {
     for (const raster::Run& run : runs) {
         const std::size_t first = IndexOf(run.first, run.row);
         const std::size_t last = IndexOf(run.last, run.row);
+        if (ink.keep == 0) {
+            std::fill(pixels.begin() + static_cast<std::ptrdiff_t>(first), pixels.begin() + static_cast<std::ptrdiff_t>(last) + 1,
+                      ink.flip);
+            continue;
+        }
         for (std::size_t at = first; at <= last; ++at) pixels[at] = (pixels[at] & ink.keep) ^ ink.flip;
     }
 }

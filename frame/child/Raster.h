@@ -20,8 +20,8 @@ namespace tessel::child {
 /// - `Circle`: the radius is in the scale's horizontal units, rounded to whole pixels; a negative radius, or none that is a
 ///   number, draws nothing. An aspect that is negative or no number counts as 1. An arc shows at least one pixel.
 /// - `PSet`: one pixel, with a wide pen a round dot, whatever the style.
-/// - `Cls` fills with the background and `PaintPicture` copies, whatever the mode. Of a picture the plane of scale 1 is taken;
-///   its pixels are drawn where they are at least half opaque.
+/// - `Cls` fills with the background, and with the picture behind the drawing; `PaintPicture` copies; whatever the mode. Of a
+///   picture the plane of scale 1 is taken; its pixels are drawn where they are at least half opaque.
 /// - `Print` draws nothing: the raster has no font.
 /// - The pen's width is held within 1 and 32,767 pixels. Broken styles count for width 1, wider pens draw them solid. The
 ///   transparent style leaves out the outline: of a filled box remains what an outline of width 1 encloses.
@@ -35,20 +35,25 @@ class Raster final : public frame::Canvas {
     /// than `maximumPixels` is made smaller.
     Raster(int width, int height, frame::OLE_COLOR background);
 
-    /// The size is held as in the constructor. Pixels that are in both sizes stay, new ones are `background`.
-    void Resize(int width, int height, frame::OLE_COLOR background);
+    /// The size is held as in the constructor. Pixels that are in both sizes stay; new ones are `background`, and the picture
+    /// behind the drawing.
+    void Resize(int width, int height, frame::OLE_COLOR background) override;
     int Width() const { return columns; }
     int Height() const { return rows; }
 
     /// RGB; nothing outside the plane.
-    std::optional<frame::OLE_COLOR> Pixel(int x, int y) const;
-    /// All pixels as 0x00BBGGRR, row by row.
+    std::optional<frame::OLE_COLOR> Pixel(int x, int y) const override;
+    /// All pixels as 0xFFBBGGRR, row by row. Who writes them leaves the high byte as it is.
     std::span<const std::uint32_t> Pixels() const { return pixels; }
+    std::span<std::uint32_t> Pixels() { return pixels; }
+    bool KeepsPixels() const override { return true; }
+    std::vector<frame::PixelPlane> Planes() const override;
     /// Outside the plane nothing happens.
     void SetPixel(int x, int y, frame::OLE_COLOR color);
 
     void Draw(const frame::DrawOp& op, const frame::Pen& pen, const frame::Scale& scale, frame::OLE_COLOR background,
               frame::OLE_COLOR foreground) override;
+    void Wipe(frame::OLE_COLOR background, const frame::PictureRef& picture) override;
 
     /// Copies the pixels in `part` of `source`, which may be this plane itself, so that the part's top left comes to (x, y).
     /// Pixels of the colour `mask` are left out, and so is what lies outside either plane.
@@ -64,7 +69,8 @@ class Raster final : public frame::Canvas {
     void DrawLine(const frame::draw::Line& line, const frame::Pen& pen, const frame::Scale& scale);
     void DrawCircle(const frame::draw::Circle& circle, const frame::Pen& pen, const frame::Scale& scale);
     void DrawDot(const frame::draw::PSet& dot, const frame::Pen& pen, const frame::Scale& scale);
-    void DrawPicture(const frame::draw::PaintPicture& picture, const frame::Scale& scale);
+    void DrawPicture(const frame::Picture* picture, raster::Point at);
+    void Clear(frame::OLE_COLOR background);
 
     raster::Area Whole() const { return {0, 0, columns, rows}; }
     /// The area whose runs can matter to the plane when they are drawn with a pen of this width.
@@ -75,6 +81,7 @@ class Raster final : public frame::Canvas {
 
     int columns = 0, rows = 0;
     std::vector<std::uint32_t> pixels;
+    frame::PictureRef behind;
 };
 
 }  // namespace tessel::child

@@ -121,6 +121,20 @@ bool Dashes::DrawsAt(std::int64_t step) const {
     return draws;
 }
 
+Runs BrushedBoxRuns(Point corner, Point opposite, int width, const Area& clip) {
+    const auto [left, right] = std::minmax({corner.x, opposite.x});
+    const auto [top, bottom] = std::minmax({corner.y, opposite.y});
+    const Brush brush(width);
+    Runs runs;
+    for (int row = std::max(top + brush.FirstRow(), clip.top); row <= std::min(bottom + brush.LastRow(), clip.bottom - 1); ++row) {
+        // Of the brush's rows that come here the one nearest to its middle is the widest.
+        const Run& span = brush.Row(std::clamp(0, row - bottom, row - top));
+        const int first = std::max(left + span.first, clip.left), last = std::min(right + span.last, clip.right - 1);
+        if (first <= last) runs.push_back({row, first, last});
+    }
+    return runs;
+}
+
 Runs Widened(Runs runs, int width, const Area& clip) {
     if (runs.empty() || clip.left >= clip.right || clip.top >= clip.bottom) return {};
     const Brush brush(width);

@@ -85,6 +85,9 @@ Arc ArcBetween(std::optional<float> start, std::optional<float> end);
 /// the arc. Half axes of 0 give a straight line, or a dot. The steps of a broken style are exact on circles.
 Runs EllipseRuns(const Ellipse& ellipse, const Arc& arc, const Dashes& dashes, const Area& clip);
 
+/// What a round brush covers that is moved over all pixels of the box between two corners, which are part of it.
+Runs BrushedBoxRuns(Point corner, Point opposite, int width, const Area& clip);
+
 /// What a round brush covers that is moved along these runs, which may overlap: all pixels within half the width of one of
 /// theirs. The middle of a brush of even width is the top left corner of the pixel.
 Runs Widened(Runs runs, int width, const Area& clip);

@@ -124,10 +124,7 @@ void SurfaceObject::SetScaleHeight(float value) {
 
 void SurfaceObject::SetInner(frame::TextSize size) {
     inner_ = size;
-    raster_.Resize(frame::PixelAt(size.width / frame::twipsPerPixel), frame::PixelAt(size.height / frame::twipsPerPixel),
-                   OleTranslateColor(BackColor(), SurfaceHost().Colors()));
+    Resized();
 }
-
-void SurfaceObject::Wiped() { raster_.Draw(frame::draw::Cls{}, {}, {}, OleTranslateColor(BackColor(), SurfaceHost().Colors()), 0); }
 
 }  // namespace tessel::headless

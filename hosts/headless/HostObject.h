@@ -62,8 +62,6 @@ class SurfaceObject : public HostObject, public frame::DrawingSurface {
   protected:
     frame::TextSize InnerSize() const override { return inner_; }
     std::optional<frame::OLE_COLOR> PixelOf(int x, int y) const override { return raster_.Pixel(x, y); }
-    void Wiped() override;
-
   private:
     void SetInner(frame::TextSize size);
 

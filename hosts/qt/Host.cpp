@@ -6,6 +6,7 @@
 
 #include "frame/Control.h"
 #include "frame/Windows1252.h"
+#include "frame/child/PictureBox.h"
 #include "hosts/posix/DiskFileSystem.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/Services.h"
@@ -35,6 +36,7 @@ Holder* HolderOf(const QObject* object) {
 struct Peers final : frame::PeerFactory {
     std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl& child) override { return qt::MakePeer(child); }
     std::unique_ptr<frame::Canvas> MakeCanvas(frame::DrawingSurface& surface, frame::Object& owner) override {
+        if (dynamic_cast<child::PictureBox*>(&owner)) return std::make_unique<SurfaceCanvas>(surface);
         auto* control = dynamic_cast<frame::Control*>(&owner);
         if (!control || &surface != &control->Surface()) return nullptr;
         SurfaceWidget& widget = *static_cast<Site*>(control->Site())->surface();

@@ -23,8 +23,8 @@ void PointerInput::Press(const QMouseEvent& event) {
     held_ |= event.button();
     doubleClicked_ = false;
     inside_ = true;
-    child_->MouseDownInput(ButtonsOf(event.button()), ShiftOf(event.modifiers()), Twips(event.position().x()),
-                           Twips(event.position().y()));
+    const Place at = PlaceOf(Twips(event.position().x()), Twips(event.position().y()));
+    child_->MouseDownInput(ButtonsOf(event.button()), ShiftOf(event.modifiers()), at.x, at.y);
 }
 
 void PointerInput::Move(const QMouseEvent& event) {
@@ -41,8 +41,8 @@ bool PointerInput::ReleaseAlone(const QMouseEvent& event) {
     if (!child_ || !(held_ & event.button())) return false;
     held_ &= ~Qt::MouseButtons(event.button());
     const bool clicks = event.button() == Qt::LeftButton && !doubleClicked_ && widget_.rect().contains(event.position().toPoint());
-    child_->MouseUpInput(ButtonsOf(event.button()), ShiftOf(event.modifiers()), Twips(event.position().x()),
-                         Twips(event.position().y()));
+    const Place at = PlaceOf(Twips(event.position().x()), Twips(event.position().y()));
+    child_->MouseUpInput(ButtonsOf(event.button()), ShiftOf(event.modifiers()), at.x, at.y);
     return clicks && child_;
 }
 
@@ -77,7 +77,8 @@ void PointerInput::Leave() {
 }
 
 void PointerInput::ReportMove(Qt::MouseButtons buttons, Qt::KeyboardModifiers modifiers, float x, float y) {
-    child_->MouseMoveInput(ButtonsOf(buttons), ShiftOf(modifiers), x, y);
+    const Place at = PlaceOf(x, y);
+    child_->MouseMoveInput(ButtonsOf(buttons), ShiftOf(modifiers), at.x, at.y);
 }
 
 }  // namespace tessel::qt

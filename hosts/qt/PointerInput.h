@@ -21,6 +21,7 @@ std::int16_t ShiftOf(Qt::KeyboardModifiers modifiers);
 class PointerInput {
   public:
     PointerInput(child::PointerChild& child, QWidget& widget) : child_(&child), widget_(widget) {}
+    virtual ~PointerInput() = default;
     /// From now on nothing is reported.
     void Disconnect() { child_ = nullptr; }
 
@@ -32,6 +33,13 @@ class PointerInput {
     void Click();
     void DoubleClick(const QMouseEvent& event);
     void Leave();
+
+  protected:
+    struct Place {
+        float x = 0, y = 0;
+    };
+    /// What is reported of a place on the widget, which is given in twips.
+    virtual Place PlaceOf(float xTwips, float yTwips) const { return {xTwips, yTwips}; }
 
   private:
     void ReportMove(Qt::MouseButtons buttons, Qt::KeyboardModifiers modifiers, float x, float y);

@@ -1,95 +1,334 @@
 #include "hosts/qt/SurfaceCanvas.h"
 
+#include <QGuiApplication>
 #include <QPainter>
+#include <QPalette>
+#include <algorithm>
 #include <cmath>
+#include <limits>
+#include <utility>
 
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/TextLayout.h"
 
 namespace tessel::qt {
 
+namespace draw = frame::draw;
+using frame::OLE_COLOR;
+
 namespace {
 
-constexpr std::uint32_t opaque = 0xFF000000u;
+constexpr double endless = 1 << 20;
 
 bool IsPenChange(const frame::DrawOp& op) {
-    return std::holds_alternative<frame::draw::DrawWidth>(op) || std::holds_alternative<frame::draw::DrawStyle>(op) ||
-           std::holds_alternative<frame::draw::DrawMode>(op);
+    return std::holds_alternative<draw::DrawWidth>(op) || std::holds_alternative<draw::DrawStyle>(op) ||
+           std::holds_alternative<draw::DrawMode>(op);
+}
+
+int Scaled(int pixels, double scale) { return static_cast<int>(std::ceil(pixels * scale)); }
+
+std::size_t BytesOf(const frame::Picture& picture) {
+    const frame::PixelPlane* largest = picture.Plane(std::numeric_limits<double>::infinity());
+    return largest ? largest->pixels.size() * sizeof(std::uint32_t) : 0;
+}
+
+/// The pixels of a raster, to be painted on: nothing is copied.
+QImage Shared(child::Raster& raster) {
+    return {reinterpret_cast<uchar*>(raster.Pixels().data()), raster.Width(), raster.Height(), QImage::Format_RGBX8888};
+}
+QImage Shared(const child::Raster& raster) {
+    return {reinterpret_cast<const uchar*>(raster.Pixels().data()), raster.Width(), raster.Height(), QImage::Format_RGBX8888};
+}
+
+/// How a stroke is drawn in the pixels of a screen, so that each of its pixels at scale 1 becomes the square of pixels that
+/// stands for it.
+struct Grid {
+    Grid(const frame::Pen& given, const frame::Scale& units, double screen)
+        : pen{std::max(1, static_cast<int>(std::lround(given.width * screen))), given.style, given.mode},
+          scale{units.originX, units.originY, units.factorX * static_cast<float>(screen),
+                units.factorY * static_cast<float>(screen)},
+          isThin(given.width == 1) {
+        // A broken style is for thin pens alone.
+        if (isThin && given.style >= draw::dash && given.style <= draw::dashDotDot) pen.width = 1;
+        const double before = given.width / 2 * screen;  // of the brush, left of and above its pixel
+        shift = isThin && pen.width == 1 ? 0 : pen.width / 2 - static_cast<int>(std::lround(before));
+    }
+    float X(float unit) const { return static_cast<float>(frame::PixelAt(scale.X(unit)) + shift); }
+    float Y(float unit) const { return static_cast<float>(frame::PixelAt(scale.Y(unit)) + shift); }
+
+    draw::Circle Fitted(draw::Circle circle) const {
+        circle.x = X(circle.x);
+        circle.y = Y(circle.y);
+        circle.radius *= std::abs(scale.factorX);
+        return circle;
+    }
+    /// A thin line ends before its last pixel at scale 1; what is left may be one dot.
+    std::variant<draw::Line, draw::PSet> Fitted(draw::Line line) const {
+        line = {X(line.x1), Y(line.y1), X(line.x2), Y(line.y2), line.color, line.box};
+        const float across = line.x2 - line.x1, down = line.y2 - line.y1;
+        const float length = std::max(std::abs(across), std::abs(down));
+        if (line.box != draw::Box::None || !isThin || pen.width == 1 || length == 0) return line;
+        const float rest = std::max(0.0f, 1 - static_cast<float>(pen.width) / length);
+        line.x2 = line.x1 + std::round(across * rest);
+        line.y2 = line.y1 + std::round(down * rest);
+        if (line.x1 == line.x2 && line.y1 == line.y2) return draw::PSet{line.x1, line.y1, line.color};
+        return line;
+    }
+
+    frame::Pen pen;
+    frame::Scale scale;
+    bool isThin;
+    int shift = 0;
+};
+
+/// The rectangle around two points in pixels at scale 1, with what a pen adds.
+QRectF Around(const frame::Scale& scale, float x1, float y1, float x2, float y2, int margin) {
+    const QRectF between(QPointF(scale.X(x1), scale.Y(y1)), QPointF(scale.X(x2), scale.Y(y2)));
+    return between.normalized().adjusted(-margin, -margin, margin, margin);
 }
 
 }  // namespace
 
-void SurfaceCanvas::Draw(const frame::DrawOp& op, const frame::Pen& pen, const frame::Scale& scale, frame::OLE_COLOR background,
-                         frame::OLE_COLOR foreground) {
+void SurfaceCanvas::ShowOn(QWidget* widget, QPoint corner) {
+    if (shown_ == widget && corner_ == corner) return;
+    shown_ = widget;
+    corner_ = corner;
+    DamageAll();
+}
+
+void SurfaceCanvas::Draw(const frame::DrawOp& op, const frame::Pen& pen, const frame::Scale& scale, OLE_COLOR background,
+                         OLE_COLOR) {
     if (IsPenChange(op)) return;  // each operation brings its pen
-    FitScreen(background);
-    const auto ratio = static_cast<float>(ratio_);
-    const frame::Scale sharp{scale.originX, scale.originY, scale.factorX * ratio, scale.factorY * ratio};
-    if (const auto* print = std::get_if<frame::draw::Print>(&op))
-        Print(*print, sharp, foreground);
-    else if (const auto* picture = std::get_if<frame::draw::PaintPicture>(&op))
-        Paint(*picture, sharp);
+    if (std::holds_alternative<draw::Cls>(op)) return Wipe(background, behind_);
+    FollowWidget();
+    Stroke stroke{op, pen, scale, surface_.ForeColor(), {}};
+    std::size_t bytes = 0;
+    if (const auto* print = std::get_if<draw::Print>(&op)) {
+        stroke.font = ToQt(*surface_.Font());
+        bytes = print->text.size();
+    } else if (const auto* paint = std::get_if<draw::PaintPicture>(&op)) {
+        // The same picture many times is held once.
+        if (paint->picture.get() != lastPicture_) bytes = BytesOf(*paint->picture);
+        lastPicture_ = paint->picture.get();
+    }
+    Damage(BoundsOf(stroke));
+    Keep(std::move(stroke), bytes);
+}
+
+void SurfaceCanvas::Wipe(OLE_COLOR, const frame::PictureRef& picture) {
+    FollowWidget();
+    behind_ = picture;
+    sizeAtFirst_ = size_;
+    steps_.clear();
+    kept_ = 0;
+    lastPicture_ = nullptr;
+    cut_ = false;
+    for (Plane& plane : planes_) plane.begun = false;
+    DamageAll();
+}
+
+void SurfaceCanvas::Resize(int width, int height, OLE_COLOR) {
+    if (sizedByWidget_ || size_ == Size{width, height}) return;
+    size_ = {width, height};
+    if (steps_.empty() && !cut_)
+        sizeAtFirst_ = size_;
     else
-        raster_.Draw(op, {static_cast<int>(std::lround(pen.width * ratio_)), pen.style, pen.mode}, sharp, background, foreground);
-    shown_.update();
+        Keep(size_, 0);
+    DamageAll();
+}
+
+void SurfaceCanvas::FollowWidget() {
+    if (!sizedByWidget_ || !shown_ || size_ == Size{shown_->width(), shown_->height()}) return;
+    size_ = {shown_->width(), shown_->height()};
+    if (steps_.empty() && !cut_)
+        sizeAtFirst_ = size_;
+    else
+        Keep(size_, 0);
+}
+
+void SurfaceCanvas::Keep(Step step, std::size_t bytes) {
+    steps_.push_back(std::move(step));
+    kept_ += sizeof(Step) + bytes;
+    if (kept_ <= maximumKept) return;
+    PlaneOf(ScreenScale());
+    for (Plane& plane : planes_) {
+        if (plane.begun) CatchUp(plane);
+        plane.done = 0;
+    }
+    std::erase_if(planes_, [](const Plane& plane) { return !plane.begun; });
+    steps_.clear();
+    kept_ = 0;
+    lastPicture_ = nullptr;
+    cut_ = true;
+}
+
+std::optional<OLE_COLOR> SurfaceCanvas::Pixel(int x, int y) const { return PlaneOf(1).raster.Pixel(x, y); }
+
+std::vector<frame::PixelPlane> SurfaceCanvas::Planes() const {
+    std::vector<frame::PixelPlane> planes = PlaneOf(1).raster.Planes();
+    if (const double scale = ScreenScale(); scale != 1) {
+        planes.push_back(PlaneOf(scale).raster.Planes().front());
+        planes.back().scale = scale;
+    }
+    return planes;
 }
 
 QImage SurfaceCanvas::Image() const {
-    if (raster_.Width() == 0 || raster_.Height() == 0) return {};
-    QImage image(raster_.Width(), raster_.Height(), QImage::Format_RGBX8888);
-    auto pixel = raster_.Pixels().begin();
-    for (int y = 0; y < image.height(); ++y) {
-        auto* const line = reinterpret_cast<std::uint32_t*>(image.scanLine(y));
-        for (int x = 0; x < image.width(); ++x) line[x] = *pixel++ | opaque;
-    }
-    image.setDevicePixelRatio(ratio_);
+    damaged_ = {};
+    if (steps_.empty() && !cut_) return {};
+    const Plane& plane = PlaneOf(ScreenScale());
+    if (plane.raster.Width() == 0 || plane.raster.Height() == 0) return {};
+    QImage image = Shared(plane.raster);
+    image.setDevicePixelRatio(plane.scale);
     return image;
 }
 
-void SurfaceCanvas::FitScreen(frame::OLE_COLOR background) {
-    if (ratio_ != shown_.devicePixelRatioF()) {
-        ratio_ = shown_.devicePixelRatioF();
-        raster_ = child::Raster(0, 0, background);
+double SurfaceCanvas::ScreenScale() const { return shown_ ? shown_->devicePixelRatioF() : qGuiApp->devicePixelRatio(); }
+
+OLE_COLOR SurfaceCanvas::Rgb(OLE_COLOR color) const { return OleTranslateColor(color, surface_.Colors()); }
+
+/// The whole drawing at a scale. Planes of a scale that neither the screen nor a reader has are dropped.
+SurfaceCanvas::Plane& SurfaceCanvas::PlaneOf(double scale) const {
+    if (const qint64 palette = QGuiApplication::palette().cacheKey(); palette_ != palette) {
+        palette_ = palette;
+        for (Plane& plane : planes_) plane.begun = plane.begun && cut_;
     }
-    const auto sharp = [this](int pixels) { return static_cast<int>(std::ceil(pixels * ratio_)); };
-    if (raster_.Width() != sharp(shown_.width()) || raster_.Height() != sharp(shown_.height()))
-        raster_.Resize(sharp(shown_.width()), sharp(shown_.height()), background);
+    auto found = std::find_if(planes_.begin(), planes_.end(), [&](const Plane& plane) { return plane.scale == scale; });
+    if (found == planes_.end()) {
+        found = planes_.emplace(planes_.end());
+        found->scale = scale;
+    }
+    if (!found->begun) {
+        const auto sharpest = std::max_element(planes_.begin(), planes_.end(), [](const Plane& a, const Plane& b) {
+            return a.begun != b.begun ? b.begun : a.scale < b.scale;
+        });
+        if (cut_ && sharpest->begun) {
+            CatchUp(*sharpest);
+            BeginFrom(*found, *sharpest);
+        } else {
+            Begin(*found);
+        }
+    }
+    CatchUp(*found);
+    const double screen = ScreenScale();
+    std::erase_if(planes_, [&](const Plane& plane) { return plane.scale != scale && plane.scale != 1 && plane.scale != screen; });
+    return *std::find_if(planes_.begin(), planes_.end(), [&](const Plane& plane) { return plane.scale == scale; });
 }
 
-template <class F>
-void SurfaceCanvas::WithPainter(F&& paint) {
-    QImage image = Image();
-    if (image.isNull()) return;
-    image.setDevicePixelRatio(1);
-    {
-        QPainter painter(&image);
-        paint(painter);
-    }
-    for (int y = 0; y < image.height(); ++y) {
-        const auto* const line = reinterpret_cast<const std::uint32_t*>(image.constScanLine(y));
-        for (int x = 0; x < image.width(); ++x) raster_.SetPixel(x, y, line[x] & ~opaque);
-    }
+void SurfaceCanvas::Begin(Plane& plane) const {
+    const OLE_COLOR background = Rgb(surface_.BackColor());
+    plane.raster.Resize(Scaled(sizeAtFirst_.width, plane.scale), Scaled(sizeAtFirst_.height, plane.scale), background);
+    plane.raster.Wipe(background, nullptr);
+    if (behind_) Paint(plane, *behind_, {});
+    plane.done = 0;
+    plane.begun = true;
 }
 
-void SurfaceCanvas::Print(const frame::draw::Print& op, const frame::Scale& scale, frame::OLE_COLOR foreground) {
-    WithPainter([&](QPainter& painter) {
-        painter.translate(scale.X(op.x), scale.Y(op.y));
-        painter.scale(ratio_, ratio_);
-        painter.setFont(ToQt(*surface_.Font()));
-        painter.setPen(QColor(frame::Red(foreground), frame::Green(foreground), frame::Blue(foreground)));
-        PaintText(painter, QRectF(0, 0, shown_.width(), shown_.height()), ToQt(op.text), Qt::AlignLeft, false);
-    });
+void SurfaceCanvas::BeginFrom(Plane& plane, const Plane& other) const {
+    plane.raster = child::Raster(Scaled(size_.width, plane.scale), Scaled(size_.height, plane.scale), Rgb(surface_.BackColor()));
+    plane.done = steps_.size();
+    plane.begun = true;
+    if (size_.width <= 0 || size_.height <= 0) return;
+    QImage image = Shared(plane.raster);
+    QPainter painter(&image);
+    painter.setRenderHint(QPainter::SmoothPixmapTransform);
+    painter.scale(plane.scale / other.scale, plane.scale / other.scale);
+    painter.drawImage(QPoint(), Shared(other.raster));
 }
 
-void SurfaceCanvas::Paint(const frame::draw::PaintPicture& op, const frame::Scale& scale) {
-    if (!op.picture || !op.picture->Plane(ratio_)) return;
-    WithPainter([&](QPainter& painter) {
-        const QRectF place(scale.X(op.x), scale.Y(op.y), Pixels(op.picture->Width()) * ratio_,
-                           Pixels(op.picture->Height()) * ratio_);
-        painter.setRenderHint(QPainter::SmoothPixmapTransform);
-        const QImage image = ToQt(*op.picture, ratio_);
-        painter.drawImage(place, image, QRectF(image.rect()));
-    });
+void SurfaceCanvas::CatchUp(Plane& plane) const {
+    for (; plane.done < steps_.size(); ++plane.done) std::visit([&](const auto& step) { Do(plane, step); }, steps_[plane.done]);
+}
+
+void SurfaceCanvas::Do(Plane& plane, const Stroke& stroke) const {
+    const Grid grid(stroke.pen, stroke.scale, plane.scale);
+    const auto raster = [&](auto op) {
+        op.color = Rgb(op.color);
+        plane.raster.Draw(op, grid.pen, {}, {}, {});
+    };
+    if (const auto* line = std::get_if<draw::Line>(&stroke.op))
+        std::visit(raster, grid.Fitted(*line));
+    else if (const auto* circle = std::get_if<draw::Circle>(&stroke.op))
+        raster(grid.Fitted(*circle));
+    else if (const auto* dot = std::get_if<draw::PSet>(&stroke.op))
+        raster(draw::PSet{grid.X(dot->x), grid.Y(dot->y), dot->color});
+    else if (const auto* print = std::get_if<draw::Print>(&stroke.op))
+        Print(plane, stroke, *print);
+    else if (const auto* paint = std::get_if<draw::PaintPicture>(&stroke.op))
+        Paint(plane, *paint->picture, QPointF(frame::PixelAt(grid.scale.X(paint->x)), frame::PixelAt(grid.scale.Y(paint->y))));
+}
+
+void SurfaceCanvas::Do(Plane& plane, const Size& size) const {
+    const int width = Scaled(size.width, plane.scale), height = Scaled(size.height, plane.scale);
+    const child::Raster before = std::exchange(plane.raster, child::Raster(width, height, Rgb(surface_.BackColor())));
+    if (behind_) Paint(plane, *behind_, {});
+    plane.raster.Blit(0, 0, before, {0, 0, before.Width(), before.Height()});
+}
+
+void SurfaceCanvas::Paint(Plane& plane, const frame::Picture& picture, QPointF place) const {
+    const frame::PixelPlane* pixels = picture.Plane(plane.scale);
+    if (!pixels || pixels->width <= 0 || pixels->height <= 0 || plane.raster.Pixels().empty()) return;
+    const QImage source(reinterpret_cast<const uchar*>(pixels->pixels.data()), pixels->width, pixels->height,
+                        QImage::Format_RGBA8888);
+    QImage image = Shared(plane.raster);
+    QPainter painter(&image);
+    if (pixels->scale == plane.scale) {
+        painter.drawImage(place, source);
+        return;
+    }
+    painter.setRenderHint(QPainter::SmoothPixmapTransform);
+    const double grown = plane.scale / pixels->scale;
+    painter.drawImage(QRectF(place, QSizeF(source.size()) * grown), source, QRectF(source.rect()));
+}
+
+void SurfaceCanvas::Print(Plane& plane, const Stroke& stroke, const draw::Print& print) const {
+    if (plane.raster.Pixels().empty()) return;
+    QImage image = Shared(plane.raster);
+    QPainter painter(&image);
+    painter.scale(plane.scale, plane.scale);
+    painter.translate(stroke.scale.X(print.x), stroke.scale.Y(print.y));
+    painter.setFont(stroke.font);
+    painter.setPen(ToQt(stroke.foreground, surface_.Colors()));
+    PaintText(painter, QRectF(0, 0, endless, endless), ToQt(print.text), Qt::AlignLeft, false);
+}
+
+/// What a stroke may touch, in pixels at scale 1.
+QRectF SurfaceCanvas::BoundsOf(const Stroke& stroke) const {
+    const int margin = stroke.pen.width / 2 + 2;
+    if (const auto* line = std::get_if<draw::Line>(&stroke.op))
+        return Around(stroke.scale, line->x1, line->y1, line->x2, line->y2, margin);
+    if (const auto* dot = std::get_if<draw::PSet>(&stroke.op)) return Around(stroke.scale, dot->x, dot->y, dot->x, dot->y, margin);
+    if (const auto* circle = std::get_if<draw::Circle>(&stroke.op)) {
+        const double radius = std::abs(circle->radius * stroke.scale.factorX) + margin;
+        return {stroke.scale.X(circle->x) - radius, stroke.scale.Y(circle->y) - radius, 2 * radius, 2 * radius};
+    }
+    if (const auto* paint = std::get_if<draw::PaintPicture>(&stroke.op))
+        return {stroke.scale.X(paint->x) - 1, stroke.scale.Y(paint->y) - 1, PixelsExactly(paint->picture->Width()) + 2,
+                PixelsExactly(paint->picture->Height()) + 2};
+    if (const auto* print = std::get_if<draw::Print>(&stroke.op)) {
+        // Not measured: no line is higher than twice its letters, and signs reach a little to the left.
+        const double letters = stroke.font.pointSizeF() * 2;
+        const auto lines = static_cast<double>(1 + std::count(print->text.begin(), print->text.end(), '\n'));
+        return {stroke.scale.X(print->x) - letters, stroke.scale.Y(print->y) - letters,
+                static_cast<double>(size_.width) * 2 + letters, lines * 2 * letters + 2 * letters};
+    }
+    return {0, 0, static_cast<double>(size_.width), static_cast<double>(size_.height)};
+}
+
+void SurfaceCanvas::Damage(const QRectF& bounds) {
+    if (!shown_) return;
+    const QRectF whole(0, 0, size_.width, size_.height);
+    // A coordinate that is no number may be anywhere.
+    const bool known = std::isfinite(bounds.x() + bounds.y() + bounds.width() + bounds.height());
+    const QRect place = (known ? bounds & whole : whole).toAlignedRect().translated(corner_);
+    if (place.isEmpty() || damaged_.contains(place)) return;
+    damaged_ |= place;
+    shown_->update(damaged_);
+}
+
+void SurfaceCanvas::DamageAll() {
+    damaged_ = {};
+    if (shown_) shown_->update();
 }
 
 }  // namespace tessel::qt

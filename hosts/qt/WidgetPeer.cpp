@@ -3,11 +3,13 @@
 #include "frame/Control.h"
 #include "frame/child/Label.h"
 #include "frame/child/ListView.h"
+#include "frame/child/PictureBox.h"
 #include "frame/child/TextBox.h"
 #include "frame/child/TreeView.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/LabelPeer.h"
 #include "hosts/qt/ListViewPeer.h"
+#include "hosts/qt/PictureBoxPeer.h"
 #include "hosts/qt/Site.h"
 #include "hosts/qt/TextBoxPeer.h"
 #include "hosts/qt/TreeViewPeer.h"
@@ -37,6 +39,7 @@ void WidgetPeer::FollowChild() {
 std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl& child) {
     if (auto* label = dynamic_cast<child::Label*>(&child)) return std::make_unique<LabelPeer>(*label);
     if (auto* list = dynamic_cast<child::ListView*>(&child)) return std::make_unique<ListViewPeer>(*list);
+    if (auto* picture = dynamic_cast<child::PictureBox*>(&child)) return std::make_unique<PictureBoxPeer>(*picture);
     if (auto* text = dynamic_cast<child::TextBox*>(&child)) return std::make_unique<TextBoxPeer>(*text);
     if (auto* tree = dynamic_cast<child::TreeView*>(&child)) return std::make_unique<TreeViewPeer>(*tree);
     return nullptr;

@@ -7,31 +7,11 @@
 #include <memory>
 
 #include "hosts/headless/HeadlessHost.h"
-#include "hosts/qt/ControlWidget.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/Host.h"
+#include "tests/hosts/qt/OwnerWidget.h"
 
 namespace tessel::qt::test {
-
-/// A control of the tests as a widget, which nobody listens to.
-template <class Owner>
-class OwnerWidget final : public ControlWidget {
-  public:
-    explicit OwnerWidget(QWidget* parent) : ControlWidget(Class(), parent) {}
-    Owner& owner() const { return static_cast<Owner&>(control()); }
-
-  protected:
-    bool hears(const frame::EventInfo&) const override { return false; }
-    void raise(const frame::EventInfo&, frame::EventArguments) override {}
-
-  private:
-    static const frame::ControlClass& Class() {
-        static constexpr frame::ClassTable table{.name = "Owner", .members = {}};
-        static const frame::ControlClass controlClass{
-            &table, [](frame::Host& host) -> std::unique_ptr<frame::Control> { return std::make_unique<Owner>(host); }};
-        return controlClass;
-    }
-};
 
 /// A window with one control of the tests on it, and the services of the headless host behind it but for those of the screen.
 template <class Owner>

@@ -18,6 +18,7 @@
 #include "hosts/qt/Host.h"
 #include "hosts/qt/Link.h"
 #include "hosts/qt/Services.h"
+#include "tests/hosts/qt/OwnerWidget.h"
 
 /// The host for Qt with the clock, the boxes, the shell and the log of the headless host, for tests that run on both.
 namespace tessel::qt::test {
@@ -124,14 +125,21 @@ class QtTestHost {
 
     template <class C>
     C& Create(const std::string& name, const headless::Placing& placing = {}) {
-        return static_cast<C&>(Create(*FindClass<C>(), name, placing));
+        if constexpr (requires { C::table; })
+            return static_cast<C&>(Create(*FindClass<C>(), name, placing));
+        else  // a control of the tests
+            return static_cast<C&>(CreateIn([&]() -> ControlWidget& { return Placed<OwnerWidget<C>>(placing); }, name, placing));
     }
     frame::Control& Create(const frame::ControlClass& controlClass, const std::string& name,
                            const headless::Placing& placing = {}) {
+        return CreateIn([&]() -> ControlWidget& { return Make(controlClass, placing); }, name, placing);
+    }
+    template <class F>
+    frame::Control& CreateIn(F&& make, const std::string& name, const headless::Placing& placing) {
         const std::size_t reports = errors.reports.size();
         host_->setUserMode(!placing.designTime);
         form_->setFont(FormFont(placing.ambientFont ? placing.ambientFont : std::make_shared<frame::Font>()));
-        ControlWidget& widget = Make(controlClass, placing);
+        ControlWidget& widget = make();
         widget.setObjectName(ToQt(name));
         if (placing.saved) widget.load(*placing.saved);
         frame::Control& control = widget.control();
