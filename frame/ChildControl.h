@@ -77,12 +77,12 @@ class ChildControl : public Object {
             host_, [&] { return Path() + "." + std::string(event); }, call);
     }
 
+    /// Whether the host has not let go of the child's control.
+    bool IsAttached() const;
+
   private:
     friend class frame::Host;
     friend class Control;
-
-    /// Whether the host has not let go of the child's control.
-    bool IsAttached() const;
 
     Control& owner_;
     frame::Host& host_;
@@ -107,14 +107,5 @@ inline constexpr std::array childMembers = {
     property<&ChildControl::ToolTipText, &ChildControl::SetToolTipText>("ToolTipText", "The tool tip."),
     method<&ChildControl::Refresh>("Refresh", "Repaints the child."),
 };
-
-/// Rows of a base class and of its own class as one table.
-template <std::size_t A, std::size_t B>
-constexpr std::array<Member, A + B> Join(const std::array<Member, A>& base, const std::array<Member, B>& own) {
-    std::array<Member, A + B> all{};
-    for (std::size_t i = 0; i < A; ++i) all[i] = base[i];
-    for (std::size_t i = 0; i < B; ++i) all[A + i] = own[i];
-    return all;
-}
 
 }  // namespace tessel::frame

@@ -10,6 +10,7 @@
 namespace tessel::frame {
 
 class Control;
+class OwnSurface;
 
 /// The default of a bag key: a value of the type that the bag holds, the ambient font, or no object.
 struct BagDefault {
@@ -74,6 +75,9 @@ const C& Of(const Control& control);
 template <class C>
 C& Of(Control& control);
 
+const OwnSurface& SurfaceOf(const Control& control);
+OwnSurface& SurfaceOf(Control& control);
+
 }  // namespace detail
 
 constexpr BagDefault ValueDefault(VarType type, double number, bool isColor = false) {
@@ -128,6 +132,39 @@ constexpr BagKey childKey(std::string_view name, VarType type, double number) {
 template <auto Child, auto Get, auto Set>
 constexpr BagKey childKey(std::string_view name, std::string_view text) {
     return childKey<Child, Get, Set>(name, TextDefault(text));
+}
+
+/// A key that lives in the control's own surface:
+/// `surfaceKey<&OwnSurface::Enabled, &OwnSurface::SetEnabled>("Enabled", VarType::Boolean, true)`.
+template <auto Get, auto Set>
+constexpr BagKey surfaceKey(std::string_view name, BagDefault onLoad, std::optional<BagDefault> onSave = {}) {
+    using T = std::remove_cvref_t<typename detail::MemberFunction<decltype(Get)>::Result>;
+    BagDefault saved = onSave.value_or(onLoad);
+    onLoad.isColor = saved.isColor = std::is_same_v<T, OLE_COLOR>;
+    return {name,
+            onLoad,
+            saved,
+            false,
+            [](Control& control, const Variant& value) { (detail::SurfaceOf(control).*Set)(FromVariant<T>(value)); },
+            [](const Control& control) -> Variant { return ToVariant((detail::SurfaceOf(control).*Get)()); }};
+}
+template <auto Get, auto Set>
+constexpr BagKey surfaceKey(std::string_view name, VarType type, double number) {
+    return surfaceKey<Get, Set>(name, ValueDefault(type, number));
+}
+
+/// A key that a load sets as a program does, by the control's public setter:
+/// `setterKey<&Splitter::MouseIcon, &Splitter::SetMouseIcon>("MouseIcon", noObject)`.
+template <auto Get, auto Set>
+constexpr BagKey setterKey(std::string_view name, BagDefault byDefault) {
+    using C = typename detail::MemberFunction<decltype(Get)>::Class;
+    using T = std::remove_cvref_t<typename detail::MemberFunction<decltype(Get)>::Result>;
+    return {name,
+            byDefault,
+            byDefault,
+            false,
+            [](Control& control, const Variant& value) { (detail::Of<C>(control).*Set)(FromVariant<T>(value)); },
+            [](const Control& control) -> Variant { return ToVariant((detail::Of<C>(control).*Get)()); }};
 }
 
 /// A child control or other part: `part<&Link::Label1>("Label1")`.

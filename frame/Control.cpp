@@ -84,4 +84,9 @@ Variant BagDefault::For(const Control& control) const {
     return Variant(number).ConvertedTo(type);
 }
 
+namespace detail {
+const OwnSurface& SurfaceOf(const Control& control) { return control.Surface(); }
+OwnSurface& SurfaceOf(Control& control) { return control.Surface(); }
+}  // namespace detail
+
 }  // namespace tessel::frame

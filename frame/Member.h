@@ -272,4 +272,13 @@ constexpr Member input(std::string_view name, std::initializer_list<std::string_
     return method<F>(name, {}, parameters);
 }
 
+/// Rows of a base class and of its own class as one table.
+template <std::size_t A, std::size_t B>
+constexpr std::array<Member, A + B> Join(const std::array<Member, A>& base, const std::array<Member, B>& own) {
+    std::array<Member, A + B> all{};
+    for (std::size_t i = 0; i < A; ++i) all[i] = base[i];
+    for (std::size_t i = 0; i < B; ++i) all[A + i] = own[i];
+    return all;
+}
+
 }  // namespace tessel::frame

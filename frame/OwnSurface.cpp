@@ -48,7 +48,15 @@ void OwnSurface::SetPicture(const PictureRef& value) {
     LookChanged();
 }
 
-void OwnSurface::Refresh() { LookChanged(); }
+void OwnSurface::Refresh() {
+    LookChanged();
+    if (Site* site = control_.Site()) site->Redraw();
+}
+
+std::pair<float, float> OwnSurface::InputPoint(float x, float y) const {
+    const TextSize place = UnitsAt(x, y);
+    return {place.width, place.height};
+}
 
 TextSize OwnSurface::InnerSize() const {
     const float border = borderStyle_ != 0 ? 2 * borderTwips : 0;
@@ -58,5 +66,9 @@ TextSize OwnSurface::InnerSize() const {
 void OwnSurface::LookChanged() {
     if (Site* site = control_.Site()) site->Repaint();
 }
+
+bool OwnSurface::TakesInput() const { return control_.Site() != nullptr; }
+
+std::string OwnSurface::InputPath() const { return control_.Path(); }
 
 }  // namespace tessel::frame

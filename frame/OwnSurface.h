@@ -1,13 +1,14 @@
 #pragma once
 
+#include "frame/PointerTarget.h"
 #include "frame/Surface.h"
 
 namespace tessel::frame {
 
 class Control;
 
-/// The surface that a control itself is.
-class OwnSurface final : public DrawingSurface {
+/// The surface that a control itself is. It takes the mouse and the keys where no child covers it.
+class OwnSurface final : public DrawingSurface, public KeyTarget {
   public:
     explicit OwnSurface(Control& control);
 
@@ -29,12 +30,18 @@ class OwnSurface final : public DrawingSurface {
     void SetBorderStyle(std::int16_t value);
     const PictureRef& Picture() const { return picture_; }
     void SetPicture(const PictureRef& value);
-    /// Asks the host to show the surface anew.
+    /// Has the surface drawn anew: the control's `Paint` runs.
     void Refresh();
+
+    frame::Host& InputHost() const override { return SurfaceHost(); }
+    TextSize InputExtent() const override { return InnerSize(); }
+    std::pair<float, float> InputPoint(float x, float y) const override;
 
   protected:
     TextSize InnerSize() const override;
     void LookChanged() override;
+    bool TakesInput() const override;
+    std::string InputPath() const override;
 
   private:
     Control& control_;

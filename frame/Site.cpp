@@ -1,8 +1,24 @@
 #include "frame/Site.h"
 
 #include "frame/Control.h"
+#include "frame/ResumeNext.h"
+#include "frame/SiblingIndex.h"
+#include "frame/Text.h"
 
 namespace tessel::frame {
+
+Object* Siblings::Find(std::string_view name, std::int32_t index) {
+    for (int i = 0; i < Count(); ++i) {
+        Object* item = nullptr;
+        ResumeNext next;
+        next([&] { item = &Item(i); });
+        if (!item) continue;
+        const auto itsName = NameOf(*item);
+        if (!itsName || !EqualsNoCase(*itsName, name)) continue;
+        if (index < 0 || IndexOf(*item) == index) return item;
+    }
+    return nullptr;
+}
 
 Site::Site(frame::Host& host) : host_(host) {}
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <memory>
 #include <optional>
 #include <string>
@@ -32,6 +33,10 @@ class Siblings {
     virtual int Count() const = 0;
     /// From 0. Error 9 for an index outside.
     virtual Object& Item(int index) = 0;
+    /// The first in order whose `Name` is this one, without regard to case; with an index of 0 or more only one whose `Index`
+    /// equals it. One that has no readable `Name`, or no `Index` where one is asked, is passed over. Null when there is none. This
+    /// is a search from the first to the last; a host may find the same sooner.
+    virtual Object* Find(std::string_view name, std::int32_t index = -1);
 };
 
 /// The place of one control in its host: what the host offers it, and its life. A host derives from this and gives one to
@@ -59,6 +64,8 @@ class Site {
     virtual std::string Path() const { return Ambient().DisplayName(); }
     /// The control's surface needs to be seen anew.
     virtual void Repaint() {}
+    /// The control's surface needs to be drawn anew: its `Paint` runs, at once or when the surface is next shown.
+    virtual void Redraw() { Paint(); }
 
     // Size and place, in twips. A set that changes nothing is none.
     float Left() const { return left_; }

@@ -11,6 +11,7 @@
 #include "apps/gallery/BrowserPage.h"
 #include "apps/gallery/FilesPage.h"
 #include "apps/gallery/LinksPage.h"
+#include "apps/gallery/PanesPage.h"
 #include "hosts/qt/Host.h"
 
 namespace tessel::gallery {
@@ -37,6 +38,7 @@ Window::Window(QWidget* parent) : QMainWindow(parent), list_(new QListWidget), s
     addPage(new LinksPage);
     addPage(new FilesPage);
     addPage(new BrowserPage);
+    addPage(new PanesPage);
     choose(0);
 }
 

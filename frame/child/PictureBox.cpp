@@ -32,6 +32,11 @@ void PictureBox::SetBorderStyle(std::int16_t value) {
     if (Store(borderStyle_, value)) Resized();
 }
 
+std::pair<float, float> PictureBox::InputPoint(float x, float y) const {
+    const frame::TextSize place = UnitsAt(x - Border() / 2, y - Border() / 2);
+    return {place.width, place.height};
+}
+
 frame::TextSize PictureBox::InnerSize() const {
     return {Width() > Border() ? Width() - Border() : 0, Height() > Border() ? Height() - Border() : 0};
 }

@@ -27,6 +27,9 @@ class PictureBox final : public KeyChild, public frame::DrawingSurface {
     std::int16_t MousePointer() const { return mousePointer_; }
     void SetMousePointer(std::int16_t value) { Store(mousePointer_, value); }
 
+    /// From the inside of the border, in the box's own scale.
+    std::pair<float, float> InputPoint(float x, float y) const override;
+
     const frame::ClassTable& Table() const override;
 
   protected:

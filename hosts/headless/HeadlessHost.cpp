@@ -1,6 +1,7 @@
 #include "hosts/headless/HeadlessHost.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "frame/ClassTable.h"
 #include "frame/Extender.h"
@@ -16,7 +17,9 @@ using frame::Variant;
 class HeadlessSite::ExtenderObject final : public frame::Extender {
   public:
     ExtenderObject(HeadlessSite& site, const HostObject::Members& members)
-        : Extender(site), site_(site), given_(site.name_, members) {}
+        : Extender(site), site_(site), given_(site.name_, members) {
+        given_.TellWhenRenamed(site.form_.Renamed());
+    }
 
     std::string Name() const override { return site_.name_; }
     bool Visible() const override { return site_.visible_; }
@@ -82,6 +85,10 @@ void HeadlessSite::SetVisible(bool value) {
         Hide();
 }
 
+void HeadlessSite::Redraw() {
+    if (visible_) Paint();
+}
+
 frame::Object& HeadlessSite::Extender() { return *extender_; }
 frame::Object* HeadlessSite::Parent() { return &form_; }
 frame::Siblings& HeadlessSite::ParentControls() { return form_; }
@@ -105,8 +112,28 @@ frame::Object& HeadlessForm::Item(int index) {
     return *items_[static_cast<std::size_t>(index)];
 }
 
+frame::Object* HeadlessForm::Find(std::string_view name, std::int32_t index) {
+    for (;;) {
+        if (std::exchange(*renamed_, false)) index_.Clear();
+        for (int next = index_.Count(); next < Count(); ++next) {
+            Object* item = items_[static_cast<std::size_t>(next)].Get();
+            index_.Add(item ? frame::NameOf(*item) : std::nullopt, item ? frame::IndexOf(*item) : std::nullopt);
+        }
+        const int place = index_.Find(name, index);
+        if (place < 0) return nullptr;
+        if (Object* found = items_[static_cast<std::size_t>(place)].Get()) return found;
+        *renamed_ = true;  // it has gone without a word: another one may stand behind it
+    }
+}
+
+void HeadlessForm::Add(Object& object) {
+    if (auto* own = dynamic_cast<HostObject*>(&object)) own->TellWhenRenamed(renamed_);
+    items_.emplace_back(object);
+}
+
 void HeadlessForm::Remove(const Object& object) {
     std::erase_if(items_, [&](const frame::Handle<Object>& item) { return item.Get() == &object; });
+    *renamed_ = true;
 }
 
 /// Writes drawing operations into the log, in the units in which the surface received them.

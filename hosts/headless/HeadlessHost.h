@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "frame/Control.h"
+#include "frame/SiblingIndex.h"
 #include "frame/Windows1252.h"
 #include "hosts/headless/HostObject.h"
 #include "hosts/headless/Log.h"
@@ -57,6 +58,7 @@ class HeadlessSite final : public frame::Site {
     void PropertyChanged(std::string_view key) override;
     frame::EventSink& Events() override;
     std::string Path() const override { return name_; }
+    void Redraw() override;
 
   private:
     class ExtenderObject;
@@ -91,11 +93,16 @@ class HeadlessForm final : public SurfaceObject, public frame::Siblings {
 
     int Count() const override { return static_cast<int>(items_.size()); }
     Object& Item(int index) override;
-    void Add(Object& object) { items_.emplace_back(object); }
+    Object* Find(std::string_view name, std::int32_t index = -1) override;
+    void Add(Object& object);
     void Remove(const Object& object);
+    /// What is set when something on the form has another name or index.
+    const std::shared_ptr<bool>& Renamed() const { return renamed_; }
 
   private:
     std::vector<frame::Handle<Object>> items_;
+    frame::SiblingIndex index_;  // of the items up to its count
+    std::shared_ptr<bool> renamed_ = std::make_shared<bool>(false);
 };
 
 /// A host without a screen: a virtual clock, boxes that answer by themselves, a disk in memory on which the shell moves, copies and

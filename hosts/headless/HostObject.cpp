@@ -54,6 +54,7 @@ frame::ObjectRef HostObject::Inner(std::string_view name) {
 
 void HostObject::SetMember(std::string_view name, Variant value) {
     constexpr std::string_view color = "Color";
+    if (renamed_ && (frame::EqualsNoCase(name, "Name") || frame::EqualsNoCase(name, "Index"))) *renamed_ = true;
     if (value.IsNumber() && name.size() >= color.size() && frame::EqualsNoCase(name.substr(name.size() - color.size()), color))
         value = value.ToColor();
     const auto found =

@@ -32,6 +32,8 @@ class HostObject : public frame::Object {
 
     /// Adds a member, or sets the one of that name. A number under a name that ends in "Color" is a colour.
     void SetMember(std::string_view name, frame::Variant value);
+    /// From now on this is set when the object's `Name` or `Index` is.
+    void TellWhenRenamed(std::shared_ptr<bool> renamed) { renamed_ = std::move(renamed); }
 
   protected:
     const frame::Variant* Find(frame::MemberKey key) const;
@@ -39,6 +41,7 @@ class HostObject : public frame::Object {
   private:
     std::string path_;
     Members members_;
+    std::shared_ptr<bool> renamed_;
 };
 
 /// A host's object with a surface: a form, a picture box of the application. It has the drawing members beside its own, and

@@ -253,6 +253,23 @@ void ControlWidget::hideEvent(QHideEvent* event) {
     enter("Hide", [](Site& site) { site.Hide(); });
 }
 
+void ControlWidget::keyPressEvent(QKeyEvent* event) {
+    const QPointer<ControlWidget> alive = this;
+    if (!designTime()) site_->surface()->ReportKey(*event);
+    if (alive) QWidget::keyPressEvent(event);
+}
+
+// The surface shows the focus where the control takes the keys there.
+void ControlWidget::focusInEvent(QFocusEvent* event) {
+    QWidget::focusInEvent(event);
+    site_->surface()->update();
+}
+
+void ControlWidget::focusOutEvent(QFocusEvent* event) {
+    QWidget::focusOutEvent(event);
+    site_->surface()->update();
+}
+
 bool ControlWidget::event(QEvent* event) {
     if (event->type() == QEvent::Polish) settle();
     return QWidget::event(event);

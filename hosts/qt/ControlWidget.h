@@ -76,6 +76,10 @@ class ControlWidget : public QWidget {
     void moveEvent(QMoveEvent* event) override;
     void showEvent(QShowEvent* event) override;
     void hideEvent(QHideEvent* event) override;
+    /// Reports the key to a control that takes the keys on its own surface.
+    void keyPressEvent(QKeyEvent* event) override;
+    void focusInEvent(QFocusEvent* event) override;
+    void focusOutEvent(QFocusEvent* event) override;
 
     /// Room for so many letters in so many lines.
     QSize textArea(int letters, int lines) const;

@@ -2,8 +2,10 @@
 
 #include <QObject>
 #include <memory>
+#include <unordered_set>
 #include <vector>
 
+#include "frame/SiblingIndex.h"
 #include "frame/Site.h"
 #include "hosts/qt/WidgetObject.h"
 
@@ -19,6 +21,7 @@ class Form final : public QObject, public WidgetObject, public frame::Siblings {
 
     int Count() const override;
     frame::Object& Item(int index) override;
+    frame::Object* Find(std::string_view name, std::int32_t index = -1) override;
 
     using WidgetObject::Get;
     const frame::ClassTable& Table() const override;
@@ -26,6 +29,10 @@ class Form final : public QObject, public WidgetObject, public frame::Siblings {
     /// The inner size in twips.
     float ScaleWidth() const;
     float ScaleHeight() const;
+
+  protected:
+    /// Sees what comes to stand on the form and what leaves it.
+    bool eventFilter(QObject* watched, QEvent* event) override;
 
   private:
     explicit Form(QWidget& widget);
@@ -36,9 +43,17 @@ class Form final : public QObject, public WidgetObject, public frame::Siblings {
 
     bool IsOfThisForm(const Member& member) const;
     void Look();
-    void LookInto(const QWidget& parent);
+    void LookInto(QWidget& parent, std::unordered_set<const QWidget*>& known);
+    void Watch(QWidget& widget);
+    void ForgetMembers() { looked_ = false; }
+    /// Makes the index anew; false when it cannot be kept right.
+    bool Indexed();
 
     std::vector<Member> members_;
+    frame::SiblingIndex index_;
+    bool looked_ = false;        // the members are those that there are
+    bool indexed_ = false;       // so is the index
+    bool indexMayMove_ = false;  // a widget's `Index` is a property of its class, whose changes are not told
 };
 
 }  // namespace tessel::qt

@@ -96,32 +96,32 @@ std::int16_t ShiftOf(const QKeyEvent& event) {
 KeyInput::~KeyInput() { Disconnect(); }
 
 void KeyInput::Disconnect() {
-    child_ = nullptr;
+    target_ = nullptr;
     held_.clear();
     if (qApp) qApp->removeEventFilter(this);
 }
 
 void KeyInput::Press(const QKeyEvent& event) {
-    if (!child_) return;
+    if (!target_) return;
     const std::int16_t code = KeyCodeOf(event);
-    const std::int16_t ascii = KeyAsciiOf(event, child_->Host().CodePage());
+    const std::int16_t ascii = KeyAsciiOf(event, target_->InputHost().CodePage());
     if (code != 0) {
         if (held_.empty()) qApp->installEventFilter(this);
         if (!Holds(code)) held_.push_back(code);
-        child_->KeyDownInput(code, ShiftOf(event));
+        target_->KeyDownInput(code, ShiftOf(event));
     }
-    if (ascii != 0 && child_) child_->KeyPressInput(ascii);
+    if (ascii != 0 && target_) target_->KeyPressInput(ascii);
 }
 
 bool KeyInput::eventFilter(QObject* receiver, QEvent* event) {
     const bool isRelease = event->type() == QEvent::KeyRelease;
-    if (!child_ || !receiver->isWidgetType() || (!isRelease && event->type() != QEvent::KeyPress)) return false;
+    if (!target_ || !receiver->isWidgetType() || (!isRelease && event->type() != QEvent::KeyPress)) return false;
     const auto& key = static_cast<const QKeyEvent&>(*event);
     const std::int16_t code = KeyCodeOf(key);
     if (key.isAutoRepeat() || !Holds(code)) return false;
     // Pressed again elsewhere: its release went to another program.
     if (isRelease || IsElsewhere(static_cast<QWidget&>(*receiver))) LetGo(code);
-    if (isRelease) child_->KeyUpInput(code, ShiftOf(key));
+    if (isRelease) target_->KeyUpInput(code, ShiftOf(key));
     return false;
 }
 

@@ -6,7 +6,7 @@
 #include <cstdint>
 #include <vector>
 
-#include "frame/child/PointerChild.h"
+#include "frame/PointerTarget.h"
 
 namespace tessel::qt {
 
@@ -21,17 +21,17 @@ std::int16_t KeyAsciiOf(const QKeyEvent& event, frame::CodePage& codePage);
 /// The shift keys after a key has been pressed or released: the sum of 1 Shift, 2 Ctrl, 4 Alt.
 std::int16_t ShiftOf(const QKeyEvent& event);
 
-/// Reports the keys that a widget gets to the child that it shows. Auto-repeat reports presses alone, and the release of a key goes
-/// to the child that got its press, wherever the focus is by then.
+/// Reports the keys that a widget gets to the child, or the control's own surface, that it shows. Auto-repeat reports presses
+/// alone, and the release of a key goes to the one that got its press, wherever the focus is by then.
 ///
-/// An input may end the child and its peer: the peer disconnects this object, which lives as long as the widget.
+/// An input may end the target and its peer: the peer disconnects this object, which lives as long as the widget.
 class KeyInput final : public QObject {
   public:
-    KeyInput(child::KeyChild& child, QWidget* widget) : QObject(widget), child_(&child) {}
+    KeyInput(frame::KeyTarget& target, QWidget* widget) : QObject(widget), target_(&target) {}
     ~KeyInput() override;
     /// From now on nothing is reported.
     void Disconnect();
-    bool IsConnected() const { return child_ != nullptr; }
+    bool IsConnected() const { return target_ != nullptr; }
 
     /// KeyDown, and KeyPress for a key that types.
     void Press(const QKeyEvent& event);
@@ -45,7 +45,7 @@ class KeyInput final : public QObject {
     bool IsElsewhere(const QWidget& receiver) const;
     void LetGo(std::int16_t code);
 
-    child::KeyChild* child_;          // null once it has gone
+    frame::KeyTarget* target_;        // null once it has gone
     std::vector<std::int16_t> held_;  // the keys whose press was reported
 };
 

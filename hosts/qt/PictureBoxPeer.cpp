@@ -37,22 +37,6 @@ void PaintSunkenBorder(QPainter& painter, const QRect& place, const QColor& grou
     ring(place.adjusted(1, 1, -1, -1), mixed(Qt::black, 0.65f), mixed(Qt::white, 0.2f));
 }
 
-/// Reports places in the scale of the box, from the inside of its border.
-class PictureInput final : public PointerInput {
-  public:
-    PictureInput(child::PictureBox& box, QWidget& widget) : PointerInput(box, widget), box_(box) {}
-
-  protected:
-    Place PlaceOf(float xTwips, float yTwips) const override {
-        const float border = box_.BorderStyle() != 0 ? frame::borderTwips : 0;
-        const frame::TextSize place = box_.UnitsAt(xTwips - border, yTwips - border);
-        return {place.width, place.height};
-    }
-
-  private:
-    child::PictureBox& box_;  // asked while it is there
-};
-
 }  // namespace
 
 /// Paints what was drawn on its box, and reports the mouse and the keys.
@@ -95,7 +79,7 @@ class PictureBoxWidget final : public QWidget {
     SurfaceCanvas* Canvas() const { return dynamic_cast<SurfaceCanvas*>(const_cast<frame::Canvas*>(&box_->Drawn())); }
 
     child::PictureBox* box_;  // null once it has gone
-    PictureInput pointer_;
+    PointerInput pointer_;
     KeyInput* keys_;
     bool focusShows_ = false;
 };

@@ -19,18 +19,19 @@ std::int16_t ShiftOf(Qt::KeyboardModifiers modifiers) {
 }
 
 void PointerInput::Press(const QMouseEvent& event) {
-    if (!child_ || ButtonsOf(event.button()) == 0) return;
+    if (!target_ || ButtonsOf(event.button()) == 0) return;
     held_ |= event.button();
     doubleClicked_ = false;
     inside_ = true;
-    const Place at = PlaceOf(Twips(event.position().x()), Twips(event.position().y()));
-    child_->MouseDownInput(ButtonsOf(event.button()), ShiftOf(event.modifiers()), at.x, at.y);
+    const auto [x, y] = PointOf(event);
+    target_->MouseDownInput(ButtonsOf(event.button()), ShiftOf(event.modifiers()), x, y);
 }
 
 void PointerInput::Move(const QMouseEvent& event) {
-    if (!child_) return;
+    if (!target_) return;
     inside_ = widget_.rect().contains(event.position().toPoint());
-    ReportMove(event.buttons(), event.modifiers(), Twips(event.position().x()), Twips(event.position().y()));
+    const auto [x, y] = PointOf(event);
+    target_->MouseMoveInput(ButtonsOf(event.buttons()), ShiftOf(event.modifiers()), x, y);
 }
 
 void PointerInput::Release(const QMouseEvent& event) {
@@ -38,30 +39,30 @@ void PointerInput::Release(const QMouseEvent& event) {
 }
 
 bool PointerInput::ReleaseAlone(const QMouseEvent& event) {
-    if (!child_ || !(held_ & event.button())) return false;
+    if (!target_ || !(held_ & event.button())) return false;
     held_ &= ~Qt::MouseButtons(event.button());
     const bool clicks = event.button() == Qt::LeftButton && !doubleClicked_ && widget_.rect().contains(event.position().toPoint());
-    const Place at = PlaceOf(Twips(event.position().x()), Twips(event.position().y()));
-    child_->MouseUpInput(ButtonsOf(event.button()), ShiftOf(event.modifiers()), at.x, at.y);
-    return clicks && child_;
+    const auto [x, y] = PointOf(event);
+    target_->MouseUpInput(ButtonsOf(event.button()), ShiftOf(event.modifiers()), x, y);
+    return clicks && target_;
 }
 
 void PointerInput::Click() {
-    if (child_) child_->ClickInput();
+    if (target_) target_->ClickInput();
 }
 
 void PointerInput::DoubleClick(const QMouseEvent& event) {
-    if (!child_ || ButtonsOf(event.button()) == 0) return;
+    if (!target_ || ButtonsOf(event.button()) == 0) return;
     held_ |= event.button();
     doubleClicked_ = true;
-    child_->DblClickInput();
+    target_->DblClickInput();
 }
 
 void PointerInput::Leave() {
-    if (!child_ || !inside_) return;
+    if (!target_ || !inside_) return;
     inside_ = false;
     const QPointF at = widget_.mapFromGlobal(QPointF(QCursor::pos()));
-    const float right = child_->Width(), bottom = child_->Height();
+    const auto [right, bottom] = target_->InputExtent();
     float x = std::clamp(Twips(at.x()), 0.0f, right), y = std::clamp(Twips(at.y()), 0.0f, bottom);
     // Something came over the widget while the pointer stood still: it goes out by the nearest edge.
     const float toEdge = std::min({x, right - x, y, bottom - y});
@@ -73,12 +74,12 @@ void PointerInput::Leave() {
         y = 0;
     else
         y = bottom;
-    ReportMove(Qt::NoButton, QGuiApplication::keyboardModifiers(), x, y);
+    const auto [unitX, unitY] = target_->InputPoint(x, y);
+    target_->MouseMoveInput(0, ShiftOf(QGuiApplication::keyboardModifiers()), unitX, unitY);
 }
 
-void PointerInput::ReportMove(Qt::MouseButtons buttons, Qt::KeyboardModifiers modifiers, float x, float y) {
-    const Place at = PlaceOf(x, y);
-    child_->MouseMoveInput(ButtonsOf(buttons), ShiftOf(modifiers), at.x, at.y);
+std::pair<float, float> PointerInput::PointOf(const QMouseEvent& event) const {
+    return target_->InputPoint(Twips(event.position().x()), Twips(event.position().y()));
 }
 
 }  // namespace tessel::qt

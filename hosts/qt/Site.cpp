@@ -97,6 +97,10 @@ void Site::Repaint() {
     if (surface_) surface_->Follow();
 }
 
+void Site::Redraw() {
+    if (surface_) surface_->DrawAnew();
+}
+
 void Site::Placed() {
     if (outer_ && outer_->settled_) outer_->followPlace();
 }

@@ -33,6 +33,7 @@ class Site final : public frame::Site, private frame::EventSink, private frame::
     frame::EventSink& Events() override { return *this; }
     std::string Path() const override { return DisplayName(); }
     void Repaint() override;
+    void Redraw() override;
 
   protected:
     void Placed() override;

@@ -3,6 +3,7 @@
 #include <qdrawutil.h>
 
 #include <QEvent>
+#include <QGuiApplication>
 #include <QPainter>
 
 #include "hosts/qt/Convert.h"
@@ -19,6 +20,12 @@ void SurfaceWidget::Show(frame::Control* control, std::function<void()> needsDra
     control_ = control;
     needsDrawing_ = std::move(needsDrawing);
     drawnFor_ = 0;
+    if (pointerInput_) pointerInput_->Disconnect();
+    if (keyInput_) keyInput_->Disconnect();
+    if (control_ && control_->Surface().Listens()) {
+        pointerInput_ = std::make_unique<PointerInput>(control_->Surface(), *this);
+        keyInput_ = new KeyInput(control_->Surface(), this);
+    }
     Follow();
 }
 
@@ -37,6 +44,11 @@ void SurfaceWidget::Follow() {
     update();
 }
 
+void SurfaceWidget::DrawAnew() {
+    drawnFor_ = 0;
+    update();
+}
+
 void SurfaceWidget::paintEvent(QPaintEvent*) {
     if (!control_) return;
     if (needsDrawing_ && drawnFor_ != devicePixelRatioF()) {
@@ -49,11 +61,15 @@ void SurfaceWidget::paintEvent(QPaintEvent*) {
     if (!IsSurroundings(surface.BackColor())) painter.fillRect(rect(), ToQt(surface.BackColor(), control_->Host().Colors()));
     if (surface.Picture()) painter.drawImage(QPoint(), ToQt(*surface.Picture(), devicePixelRatioF()));
     if (canvas) painter.drawImage(QPoint(), canvas->Image());
-    if (surface.BorderStyle() == 0) return;
-    if (surface.Appearance() != 0)
-        qDrawWinPanel(&painter, rect(), palette(), true);
-    else
-        qDrawPlainRect(&painter, rect(), palette().color(QPalette::WindowText));
+    if (surface.BorderStyle() != 0) {
+        if (surface.Appearance() != 0)
+            qDrawWinPanel(&painter, rect(), palette(), true);
+        else
+            qDrawPlainRect(&painter, rect(), palette().color(QPalette::WindowText));
+    }
+    if (!keyInput_ || !parentWidget() || !parentWidget()->hasFocus()) return;
+    constexpr int focusMark = 2;
+    qDrawPlainRect(&painter, rect(), palette().color(QPalette::Highlight), focusMark);
 }
 
 void SurfaceWidget::resizeEvent(QResizeEvent*) { drawnFor_ = 0; }
@@ -61,6 +77,50 @@ void SurfaceWidget::resizeEvent(QResizeEvent*) { drawnFor_ = 0; }
 void SurfaceWidget::changeEvent(QEvent* event) {
     if (event->type() == QEvent::PaletteChange) drawnFor_ = 0;
     QWidget::changeEvent(event);
+}
+
+// Input.
+
+/// Where the event happened on the control. The pointer's place on the screen is the truth: the widget may have moved since the
+/// event was made, and stands on whole pixels, where the control stands between them.
+QMouseEvent SurfaceWidget::AtTruePlace(const QMouseEvent& event) const {
+    QPointF place = mapFromGlobal(event.globalPosition());
+    const frame::Site* site = control_ ? control_->Site() : nullptr;
+    const QWidget* outer = parentWidget();
+    if (site && outer && outer->pos() == QPoint(Pixels(site->Left()), Pixels(site->Top())))
+        place += QPointF(outer->x() - PixelsExactly(site->Left()), outer->y() - PixelsExactly(site->Top()));
+    return {event.type(),   place,           event.scenePosition(), event.globalPosition(),
+            event.button(), event.buttons(), event.modifiers(),     event.pointingDevice()};
+}
+
+void SurfaceWidget::mousePressEvent(QMouseEvent* event) {
+    if (!pointerInput_) return QWidget::mousePressEvent(event);
+    pointerInput_->Press(AtTruePlace(*event));
+}
+
+void SurfaceWidget::mouseMoveEvent(QMouseEvent* event) {
+    if (!pointerInput_) return QWidget::mouseMoveEvent(event);
+    pointerInput_->Move(AtTruePlace(*event));
+}
+
+void SurfaceWidget::mouseReleaseEvent(QMouseEvent* event) {
+    if (!pointerInput_) return QWidget::mouseReleaseEvent(event);
+    pointerInput_->Release(AtTruePlace(*event));
+}
+
+void SurfaceWidget::mouseDoubleClickEvent(QMouseEvent* event) {
+    if (!pointerInput_) return QWidget::mouseDoubleClickEvent(event);
+    pointerInput_->DoubleClick(AtTruePlace(*event));
+}
+
+void SurfaceWidget::leaveEvent(QEvent* event) {
+    if (!pointerInput_) return QWidget::leaveEvent(event);
+    // A box that opens in the middle of a drag is no leaving.
+    if (QGuiApplication::mouseButtons() == Qt::NoButton) pointerInput_->Leave();
+}
+
+void SurfaceWidget::ReportKey(const QKeyEvent& event) {
+    if (keyInput_) keyInput_->Press(event);
 }
 
 }  // namespace tessel::qt

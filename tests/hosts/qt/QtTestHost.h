@@ -18,6 +18,7 @@
 #include "hosts/qt/Host.h"
 #include "hosts/qt/Link.h"
 #include "hosts/qt/Services.h"
+#include "hosts/qt/Splitter.h"
 #include "tests/hosts/qt/OwnerWidget.h"
 
 /// The host for Qt with the clock, the boxes, the shell and the log of the headless host, for tests that run on both.
@@ -206,6 +207,7 @@ class QtTestHost {
         if (controlClass.table->name == "FileView") return Placed<FileView>(placing);
         if (controlClass.table->name == "FolderView") return Placed<FolderView>(placing);
         if (controlClass.table->name == "Link") return Placed<Link>(placing);
+        if (controlClass.table->name == "Splitter") return Placed<Splitter>(placing);
         throw frame::ControlError(frame::errors::notSupported);
     }
     template <class Widget>
