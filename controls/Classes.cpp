@@ -6,6 +6,7 @@
 #include "controls/fileview/FileView.h"
 #include "controls/folderview/FolderView.h"
 #include "controls/link/Link.h"
+#include "controls/scorecard/ScoreCard.h"
 #include "controls/splitter/Splitter.h"
 #include "frame/Text.h"
 
@@ -17,7 +18,7 @@ template <class C>
 constexpr frame::ControlClass classOf{
     &C::table, [](frame::Host& host) -> std::unique_ptr<frame::Control> { return std::make_unique<C>(host); }};
 
-constexpr std::array classes = {classOf<FileView>, classOf<FolderView>, classOf<Link>, classOf<Splitter>};
+constexpr std::array classes = {classOf<FileView>, classOf<FolderView>, classOf<Link>, classOf<ScoreCard>, classOf<Splitter>};
 
 }  // namespace
 

@@ -80,7 +80,7 @@ Variant BagDefault::For(const Control& control) const {
             break;
     }
     if (type == VarType::String) return text;
-    if (isColor) return OLE_COLOR(static_cast<std::uint32_t>(static_cast<std::int64_t>(number)));
+    if (isColor && type == VarType::Long) return OLE_COLOR(static_cast<std::uint32_t>(static_cast<std::int64_t>(number)));
     return Variant(number).ConvertedTo(type);
 }
 

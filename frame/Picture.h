@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <deque>
 #include <functional>
 #include <memory>
 #include <string>
@@ -26,13 +27,17 @@ class Picture final : public Object {
     /// A picture of which only the size is known, in twips.
     Picture(float width, float height, std::string source) : width_(width), height_(height), source_(std::move(source)) {}
     Picture(std::vector<PixelPlane> planes, std::string source);
+    /// A picture of this size in twips that is drawn at each scale when it is first wanted there.
+    using Drawing = std::function<PixelPlane(double scale)>;
+    Picture(float width, float height, Drawing drawing) : width_(width), height_(height), drawing_(std::move(drawing)) {}
 
     /// The natural size in twips: at scale 1 a pixel is 15 twips.
     float Width() const { return width_; }
     float Height() const { return height_; }
     /// The file that it was loaded from; empty for one that was drawn.
     const std::string& Source() const { return source_; }
-    /// The plane of the least scale that is not below `scale`, else that of the greatest; null when there is none.
+    /// The plane of the least scale that is not below `scale`, else that of the greatest; null when there is none. A picture that
+    /// is drawn has one of the scale itself, in quarters and up to 8.
     const PixelPlane* Plane(double scale) const;
 
     const ClassTable& Table() const override;
@@ -44,7 +49,9 @@ class Picture final : public Object {
 
     float width_ = 0, height_ = 0;
     std::string source_;
-    std::vector<PixelPlane> planes_;
+    Drawing drawing_;
+    mutable std::deque<PixelPlane>
+        planes_;  // those of a picture that is drawn come when they are asked for, and stay where they are
 };
 
 using PictureRef = std::shared_ptr<Picture>;

@@ -12,6 +12,7 @@
 #include "apps/gallery/FilesPage.h"
 #include "apps/gallery/LinksPage.h"
 #include "apps/gallery/PanesPage.h"
+#include "apps/gallery/ScoresPage.h"
 #include "hosts/qt/Host.h"
 
 namespace tessel::gallery {
@@ -39,6 +40,7 @@ Window::Window(QWidget* parent) : QMainWindow(parent), list_(new QListWidget), s
     addPage(new FilesPage);
     addPage(new BrowserPage);
     addPage(new PanesPage);
+    addPage(new ScoresPage);
     choose(0);
 }
 

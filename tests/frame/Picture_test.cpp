@@ -2,6 +2,8 @@
 
 #include <gtest/gtest.h>
 
+#include <limits>
+
 #include "frame/Font.h"
 #include "frame/Variant.h"
 #include "tests/frame/TestControl.h"
@@ -69,6 +71,57 @@ TEST(Picture, ShowsItsSizeByNameAndRefusesToBeSet) {
     EXPECT_EQ(picture.Get("Height").ToSingle(), 300);
     EXPECT_EQ(test::ErrorOf([&] { picture.Put("Width", 1); }), errors::notAtRunTime);
     EXPECT_EQ(picture.Width(), 150);
+}
+
+PictureRef Counted(int& drawings) {
+    return std::make_shared<Picture>(150.0f, 300.0f, [&drawings](double scale) {
+        ++drawings;
+        return PlaneOf(scale, static_cast<int>(10 * scale), static_cast<int>(20 * scale), 0xFF0000FF);
+    });
+}
+
+TEST(Picture, ThatIsDrawnIsDrawnWhenAScaleIsFirstWanted) {
+    int drawings = 0;
+    const PictureRef picture = Counted(drawings);
+    EXPECT_EQ(picture->Width(), 150);
+    EXPECT_EQ(picture->Height(), 300);
+    EXPECT_EQ(drawings, 0);
+    const PixelPlane* once = picture->Plane(1);
+    ASSERT_NE(once, nullptr);
+    EXPECT_EQ(once->width, 10);
+    EXPECT_EQ(picture->Plane(2)->width, 20);
+    EXPECT_EQ(picture->Plane(1), once) << "a plane stays where it is";
+    EXPECT_EQ(drawings, 2);
+}
+
+TEST(Picture, ThatIsDrawnHasScalesInQuartersFromOneToEight) {
+    int drawings = 0;
+    const PictureRef picture = Counted(drawings);
+    EXPECT_EQ(picture->Plane(1.1)->scale, 1.25);
+    EXPECT_EQ(picture->Plane(1.25)->scale, 1.25);
+    for (const double small : {0.5, 0.0, -3.0, std::numeric_limits<double>::quiet_NaN()})
+        EXPECT_EQ(picture->Plane(small)->scale, 1);
+    for (const double large : {8.0, 9.0, 1e300, std::numeric_limits<double>::infinity()})
+        EXPECT_EQ(picture->Plane(large)->scale, 8);
+    EXPECT_EQ(drawings, 3);
+}
+
+TEST(Picture, ThatIsDrawnEqualsItselfAlone) {
+    int drawings = 0;
+    const PictureRef one = Counted(drawings), other = Counted(drawings);
+    EXPECT_TRUE(one->EqualsObject(*one));
+    EXPECT_FALSE(one->EqualsObject(*other));
+    EXPECT_FALSE(one->EqualsObject(Picture(150, 300, "")));
+    EXPECT_FALSE(Picture(150, 300, "").EqualsObject(*one));
+    EXPECT_EQ(drawings, 0);
+}
+
+TEST(Picture, ThatIsDrawnAndMappedIsMappedWhenItIsDrawn) {
+    int drawings = 0;
+    const PictureRef mapped = MapPixels(Counted(drawings), [](std::uint32_t) { return 0xFF123456u; });
+    EXPECT_EQ(drawings, 0);
+    EXPECT_EQ(mapped->Width(), 150);
+    EXPECT_EQ(mapped->Plane(1)->pixels.front(), 0xFF123456u);
 }
 
 }  // namespace

@@ -14,6 +14,7 @@
 #include "frame/ClassTable.h"
 #include "frame/Dates.h"
 #include "frame/Text.h"
+#include "frame/child/ImageList.h"
 #include "tools/tessel-host/DiskRequests.h"
 #include "tools/tessel-host/Fields.h"
 #include "tools/tessel-host/ObjectPath.h"
@@ -351,6 +352,21 @@ frame::MemberKey KeyOf(const Json& name) {
     return std::string_view(name.get_ref<const std::string&>());
 }
 
+/// A picture that a child has from an image list beside it is named by that image.
+Json ValueOf(const frame::Object& holder, const Variant& value) {
+    const auto* child = dynamic_cast<const frame::ChildControl*>(&holder);
+    if (!child || value.Type() != frame::VarType::Object) return ToJson(value);
+    const frame::ObjectRef object = value.ToObject();
+    const auto* picture = dynamic_cast<const frame::Picture*>(object.Get());
+    if (!picture) return ToJson(value);
+    for (frame::ChildControl* other : child->Owner().Children()) {
+        const auto* images = dynamic_cast<const child::ImageList*>(other);
+        child::ListImage* image = images ? images->ListImages.FindPicture(*picture) : nullptr;
+        if (image) return ToJson(frame::ObjectRef(*image));
+    }
+    return ToJson(value);
+}
+
 }  // namespace
 
 Json Session::Get(const Request& request) {
@@ -360,7 +376,7 @@ Json Session::Get(const Request& request) {
     frame::Object& holder = Holder(*object, key);
     if (!key.ByNumber() && arguments.empty() && !holder.Has(key))
         if (const frame::ObjectRef inner = object->Inner(key.Name()); inner.Get()) return ToJson(inner);
-    return ToJson(holder.Get(key, arguments));
+    return ValueOf(holder, holder.Get(key, arguments));
 }
 
 Json Session::Put(const Request& request) {

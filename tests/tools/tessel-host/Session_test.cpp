@@ -392,6 +392,16 @@ TEST_F(SessionTest, ASiblingWithASurfaceIsDrawnOn) {
     EXPECT_EQ(Value(R"({"do":"call","of":"Q","name":"Cls"})"), "error 438");
 }
 
+TEST_F(SessionTest, APictureFromAnImageListIsNamedByItsImage) {
+    for (const char* name : {"ScoreCard1", "ScoreCard2"}) {
+        Answer(Json{{"do", "create"}, {"class", "ScoreCard"}, {"name", name}, {"mode", "run"}, {"bag", {{"Style", 2}}}}.dump());
+        EXPECT_EQ(Get(std::string(name) + ".Picture1", "Picture"),
+                  "{\"object\":\"" + std::string(name) + ".ImageList16.ListImages(\\\"Smiley3\\\")\"}");
+    }
+    Put("ScoreCard1", "Style", 7);
+    EXPECT_EQ(Get("ScoreCard1.Picture1", "Picture"), "null");
+}
+
 TEST_F(SessionTest, AFormHoldsWhatComesNextUntilAnotherIsNamed) {
     EXPECT_EQ(Get("Form1", "Name"), "\"Form1\"");
     EXPECT_EQ(Value(R"({"do":"form","name":"Form2","ScaleMode":3,"ScaleWidth":1500,"BackColor":255,"Caption":"x"})"), "\"Form2\"");
