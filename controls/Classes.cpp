@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 
+#include "controls/datalist/DataList.h"
 #include "controls/fileview/FileView.h"
 #include "controls/folderview/FolderView.h"
 #include "controls/link/Link.h"
@@ -18,7 +19,8 @@ template <class C>
 constexpr frame::ControlClass classOf{
     &C::table, [](frame::Host& host) -> std::unique_ptr<frame::Control> { return std::make_unique<C>(host); }};
 
-constexpr std::array classes = {classOf<FileView>, classOf<FolderView>, classOf<Link>, classOf<ScoreCard>, classOf<Splitter>};
+constexpr std::array classes = {classOf<DataList>,  classOf<FileView>,  classOf<FolderView>, classOf<Link>,
+                                classOf<ScoreCard>, classOf<Splitter>};
 
 }  // namespace
 

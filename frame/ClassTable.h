@@ -12,9 +12,9 @@ namespace tessel::frame {
 class Control;
 class OwnSurface;
 
-/// The default of a bag key: a value of the type that the bag holds, the ambient font, or no object.
+/// The default of a bag key: a value of the type that the bag holds, the ambient font, no object, or none at all.
 struct BagDefault {
-    enum class Source : std::uint8_t { Value, AmbientFont, NoObject };
+    enum class Source : std::uint8_t { Value, AmbientFont, NoObject, None };
 
     Source source = Source::Value;
     VarType type = VarType::Empty;
@@ -35,6 +35,13 @@ struct BagKey {
     Variant (*save)(const Control&) = nullptr;
 };
 
+/// A key that a save writes behind those of the bag and a load never asks for.
+struct SavedKey {
+    std::string_view name;
+    BagDefault onSave;
+    Variant (*save)(const Control&) = nullptr;
+};
+
 /// A part that is reached by its name under the object: a child control, a collection, a property that holds an object.
 struct Part {
     std::string_view name;
@@ -48,6 +55,7 @@ struct ClassTable {
     std::span<const EventInfo* const> events = {};
     std::span<const BagKey> bag = {};                   ///< in load order
     std::span<const std::string_view> savedOrder = {};  ///< keys in save order, where it is not the load order
+    std::span<const SavedKey> savedBehind = {};         ///< written at the end of a save, a name even twice
     std::span<const Part> parts = {};
     std::span<const Member> inputs = {};  ///< what a toolkit reports
     std::string_view defaultMember = {};
@@ -85,6 +93,7 @@ constexpr BagDefault ValueDefault(VarType type, double number, bool isColor = fa
 }
 constexpr BagDefault TextDefault(std::string_view text) { return {BagDefault::Source::Value, VarType::String, 0, text}; }
 inline constexpr BagDefault ambientFont{.source = BagDefault::Source::AmbientFont, .type = VarType::Object};
+inline constexpr BagDefault noDefault{.source = BagDefault::Source::None};
 inline constexpr BagDefault noObject{.source = BagDefault::Source::NoObject, .type = VarType::Object};
 
 /// A key that lives in an own field: `key<&Link::own, &Link::Own::BorderSize>("BorderSize", VarType::Integer, 30)`.

@@ -28,15 +28,14 @@ void Control::ReadProperties(const PropertyBag& bag) {
 void Control::WriteProperties(PropertyBag& bag) const {
     const auto write = [&](const BagKey& key) { bag.WriteProperty(key.name, key.save(*this), key.onSave.For(*this)); };
     const ClassTable& table = Table();
-    if (table.savedOrder.empty()) {
+    if (table.savedOrder.empty())
         for (const BagKey& key : table.bag) write(key);
-        return;
-    }
     for (const std::string_view name : table.savedOrder) {
         const auto found = std::find_if(table.bag.begin(), table.bag.end(), [&](const BagKey& key) { return key.name == name; });
         assert(found != table.bag.end());
         write(*found);
     }
+    for (const SavedKey& key : table.savedBehind) bag.WriteProperty(key.name, key.save(*this), key.onSave.For(*this));
 }
 
 FontRef Control::AmbientFont() const { return site_ ? site_->Ambient().Font() : std::make_shared<Font>(); }
@@ -76,6 +75,8 @@ Variant BagDefault::For(const Control& control) const {
             return ObjectRef(control.AmbientFont());
         case Source::NoObject:
             return ObjectRef();
+        case Source::None:
+            return {};
         case Source::Value:
             break;
     }

@@ -11,6 +11,7 @@
 #include "apps/gallery/BrowserPage.h"
 #include "apps/gallery/FilesPage.h"
 #include "apps/gallery/LinksPage.h"
+#include "apps/gallery/ListsPage.h"
 #include "apps/gallery/PanesPage.h"
 #include "apps/gallery/ScoresPage.h"
 #include "hosts/qt/Host.h"
@@ -41,6 +42,7 @@ Window::Window(QWidget* parent) : QMainWindow(parent), list_(new QListWidget), s
     addPage(new BrowserPage);
     addPage(new PanesPage);
     addPage(new ScoresPage);
+    addPage(new ListsPage);
     choose(0);
 }
 

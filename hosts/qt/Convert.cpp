@@ -145,6 +145,7 @@ QVariant ToQt(const Variant& value, const frame::TypeInfo& type, const frame::Sy
 }
 
 Variant FromQt(const QVariant& value) {
+    if (value.metaType() == QMetaType::fromType<frame::ObjectRef>()) return value.value<frame::ObjectRef>();
     switch (value.typeId()) {
         case QMetaType::UnknownType:
             return Variant::Missing();

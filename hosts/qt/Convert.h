@@ -44,7 +44,7 @@ frame::PixelPlane PlaneOf(const QImage& image, double scale);
 /// A value as a Qt program expects it for a member of this type: a colour as `QColor`, a font as `QFont`, an enumeration as
 /// `int`. Invalid for an empty or missing value and for an object without such a form.
 QVariant ToQt(const frame::Variant& value, const frame::TypeInfo& type, const frame::SystemColors& system);
-/// An invalid variant is a missing value. Error 13 for a type that has no form here.
+/// An invalid variant is a missing value; a `frame::ObjectRef` is the object. Error 13 for a type that has no form here.
 frame::Variant FromQt(const QVariant& value);
 
 /// Whole pixels of a length or a place in twips.

@@ -1,11 +1,13 @@
 #include "hosts/qt/WidgetPeer.h"
 
 #include "frame/Control.h"
+#include "frame/child/ComboList.h"
 #include "frame/child/Label.h"
 #include "frame/child/ListView.h"
 #include "frame/child/PictureBox.h"
 #include "frame/child/TextBox.h"
 #include "frame/child/TreeView.h"
+#include "hosts/qt/ComboListPeer.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/LabelPeer.h"
 #include "hosts/qt/ListViewPeer.h"
@@ -37,6 +39,7 @@ void WidgetPeer::FollowChild() {
 }
 
 std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl& child) {
+    if (auto* combo = dynamic_cast<child::ComboList*>(&child)) return std::make_unique<ComboListPeer>(*combo);
     if (auto* label = dynamic_cast<child::Label*>(&child)) return std::make_unique<LabelPeer>(*label);
     if (auto* list = dynamic_cast<child::ListView*>(&child)) return std::make_unique<ListViewPeer>(*list);
     if (auto* picture = dynamic_cast<child::PictureBox*>(&child)) return std::make_unique<PictureBoxPeer>(*picture);

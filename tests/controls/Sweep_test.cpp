@@ -258,9 +258,9 @@ bool LoadsWhatASaveLeavesOut(const frame::BagKey& key) {
 
 /// The properties that take a value only where there is something to choose it from.
 bool ChoosesFromWhatIsThere(const std::string& path) {
-    static const std::set<std::string, std::less<>> names = {"Icons",     "SmallIcons",   "ColumnHeaderIcons",
-                                                             "ImageList", "SelectedItem", "DropHighlight",
-                                                             "TopIndex",  "ImageWidth",   "ImageHeight"};
+    static const std::set<std::string, std::less<>> names = {"Icons",        "SmallIcons",    "ColumnHeaderIcons", "ImageList",
+                                                             "SelectedItem", "DropHighlight", "TopIndex",          "ImageWidth",
+                                                             "ImageHeight",  "ListIndex"};
     return names.contains(std::string_view(path).substr(path.rfind('.') + 1));
 }
 
@@ -366,6 +366,11 @@ TEST_P(Sweep, EveryKeyIsWrittenOnceInTheOrderOfSaving) {
     AskedBag bag;
     Make().WriteProperties(bag);
     const auto order = Table().savedOrder;
+    for (auto behind = Table().savedBehind; !behind.empty(); behind = behind.first(behind.size() - 1)) {
+        ASSERT_FALSE(bag.writes.empty());
+        EXPECT_EQ(bag.writes.back(), behind.back().name);
+        bag.writes.pop_back();
+    }
     EXPECT_EQ(bag.writes, order.empty() ? KeysOf(Table()) : std::vector<std::string>(order.begin(), order.end()));
     EXPECT_THAT(bag.writes, testing::UnorderedElementsAreArray(KeysOf(Table())));
     EXPECT_EQ(std::set<std::string>(bag.writes.begin(), bag.writes.end()).size(), bag.writes.size());

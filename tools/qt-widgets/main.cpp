@@ -3,6 +3,7 @@
 #include <map>
 #include <sstream>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "controls/Classes.h"
@@ -110,7 +111,9 @@ bool IsOfEveryWidget(const Member& member) { return member.name == "Enabled"; }
 
 class Writer {
   public:
-    explicit Writer(const ClassTable& table) : table_(table), name_(table.name) {
+    /// `beside` names functions of the base that stand beside members of the same name.
+    Writer(const ClassTable& table, std::vector<std::string> beside)
+        : table_(table), name_(table.name), beside_(std::move(beside)) {
         for (const Member& member : table.members) {
             if (member.isMethod)
                 methods_.push_back(&member);
@@ -132,6 +135,7 @@ class Writer {
              << "    /// The control itself: its members as C++ functions, with exceptions for errors.\n"
              << "    controls::" << name_ << "& control() const { return static_cast<controls::" << name_
              << "&>(ControlWidget::control()); }\n\n";
+        for (const std::string& function : beside_) file << "    using " << base << "::" << function << ";\n\n";
         WriteEnumerations(file);
         for (const Member* member : properties_) {
             if (IsOfEveryWidget(*member)) continue;
@@ -293,6 +297,7 @@ class Writer {
 
     const ClassTable& table_;
     std::string name_;
+    std::vector<std::string> beside_;
     std::vector<const Member*> properties_, methods_;
 };
 
@@ -309,10 +314,10 @@ bool Write(const std::string& name, const std::string& text) {
 
 }  // namespace
 
-/// tessel-qt-widgets class base folder: writes <class>.h and <class>.cpp, a widget that derives from `base`.
+/// tessel-qt-widgets class base folder [function...]: writes <class>.h and <class>.cpp, a widget that derives from `base`.
 int main(int count, char** arguments) {
-    if (count != 4) {
-        std::cerr << "usage: tessel-qt-widgets class base folder\n";
+    if (count < 4) {
+        std::cerr << "usage: tessel-qt-widgets class base folder [function...]\n";
         return 2;
     }
     const ControlClass* controlClass = tessel::controls::FindControlClass(arguments[1]);
@@ -320,7 +325,7 @@ int main(int count, char** arguments) {
         std::cerr << "tessel-qt-widgets: no class " << arguments[1] << '\n';
         return 2;
     }
-    const Writer writer(*controlClass->table);
+    const Writer writer(*controlClass->table, {arguments + 4, arguments + count});
     std::ostringstream header, source;
     writer.WriteHeader(header, arguments[2]);
     writer.WriteSource(source, arguments[2]);

@@ -43,6 +43,7 @@ std::string DefaultText(const BagDefault& value) {
     switch (value.source) {
         case BagDefault::Source::AmbientFont: return "the ambient font";
         case BagDefault::Source::NoObject: return "no object";
+        case BagDefault::Source::None: return "none";
         case BagDefault::Source::Value: break;
     }
     if (value.type == VarType::String) return "\"" + std::string(value.text) + "\"";
@@ -78,6 +79,14 @@ void WriteBag(std::ostream& page, const ClassTable& table) {
         if (DefaultText(key.onSave) != DefaultText(key.onLoad)) page << "; on save " << DefaultText(key.onSave);
         page << " |\n";
     }
+    if (table.savedBehind.empty()) return;
+    page << "\nBehind them a save writes, and a load does not read: ";
+    const char* separator = "";
+    for (const SavedKey& key : table.savedBehind) {
+        page << separator << '`' << key.name << "` (default " << DefaultText(key.onSave) << ")";
+        separator = ", ";
+    }
+    page << ".\n";
 }
 
 void WriteEnumerations(std::ostream& page, const ClassTable& table) {

@@ -169,14 +169,29 @@ Json Session::Attempt(const Request& request) {
 Json Session::Value(const Request& request) {
     using Method = Json (Session::*)(const Request&);
     static constexpr std::pair<std::string_view, Method> requests[] = {
-        {"form", &Session::Form},       {"sibling", &Session::Sibling}, {"create", &Session::Create},
-        {"show", &Session::Show},       {"hide", &Session::Hide},       {"paint", &Session::Paint},
-        {"save", &Session::Save},       {"destroy", &Session::Destroy}, {"resize", &Session::Resize},
-        {"ambient", &Session::Ambient}, {"get", &Session::Get},         {"put", &Session::Put},
-        {"call", &Session::Call},       {"fire", &Session::Fire},       {"handler", &Session::Handle},
-        {"advance", &Session::Advance}, {"random", &Session::Random},   {"now", &Session::Now},
-        {"answers", &Session::Answers}, {"shell", &Session::Shell},     {"disk", &Session::Disk},
+        {"form", &Session::Form},
+        {"sibling", &Session::Sibling},
+        {"create", &Session::Create},
+        {"show", &Session::Show},
+        {"hide", &Session::Hide},
+        {"paint", &Session::Paint},
+        {"save", &Session::Save},
+        {"destroy", &Session::Destroy},
+        {"resize", &Session::Resize},
+        {"ambient", &Session::Ambient},
+        {"get", &Session::Get},
+        {"put", &Session::Put},
+        {"call", &Session::Call},
+        {"fire", &Session::Fire},
+        {"handler", &Session::Handle},
+        {"advance", &Session::Advance},
+        {"random", &Session::Random},
+        {"now", &Session::Now},
+        {"answers", &Session::Answers},
+        {"shell", &Session::Shell},
+        {"disk", &Session::Disk},
         {"special", &Session::Special},
+        {"recordset", &Session::Recordset},
     };
     if (!request.is_object()) Refuse("A request is an object");
     const std::string name = RequiredText(request, "do");
@@ -524,10 +539,29 @@ Json Session::Special(const Request& request) {
     return nullptr;
 }
 
+Json Session::Recordset(const Request& request) {
+    const std::string name = NameIn(request);
+    std::vector<std::string> columns;
+    for (const Json& column : ListIn(request, "columns")) columns.push_back(TextOf(column, "columns"));
+    std::vector<headless::MemoryRecordset::Row> rows;
+    for (const Json& row : ListIn(request, "rows")) {
+        if (!row.is_array()) Refuse("\"rows\" must be a list of lists");
+        auto& values = rows.emplace_back();
+        for (const Json& value : row) values.push_back(From(value));
+    }
+    auto made = std::make_unique<headless::MemoryRecordset>(name, std::move(columns), std::move(rows));
+    std::erase_if(recordsets_, [&](const auto& known) { return EqualsNoCase(known->Path(), name); });
+    if (Root(name).Get()) throw ControlError(frame::errors::keyInUse);
+    recordsets_.push_back(std::move(made));
+    return ToJson(frame::ObjectRef(*recordsets_.back()));
+}
+
 frame::ObjectRef Session::Root(std::string_view name) {
     if (auto* site = host_.FindSite(name)) return frame::ObjectRef(site->Control());
     for (const auto& sibling : siblings_)
         if (EqualsNoCase(sibling->Path(), name)) return frame::ObjectRef(*sibling);
+    for (const auto& recordset : recordsets_)
+        if (EqualsNoCase(recordset->Path(), name)) return frame::ObjectRef(*recordset);
     if (auto* form = host_.FindForm(name)) return frame::ObjectRef(*form);
     for (const auto& module : modules_)
         if (EqualsNoCase(module->Path(), name)) return frame::ObjectRef(*module);

@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "hosts/headless/HeadlessHost.h"
+#include "hosts/headless/MemoryRecordset.h"
 #include "tools/tessel-host/Json.h"
 
 namespace tessel::tools {
@@ -64,6 +65,7 @@ class Session {
     Json Shell(const Request& request);
     Json Disk(const Request& request);
     Json Special(const Request& request);
+    Json Recordset(const Request& request);
 
     // Objects.
     frame::ObjectRef Root(std::string_view name);
@@ -89,6 +91,7 @@ class Session {
     std::unique_ptr<frame::FileSystem> realDisk_;  // null with the memory disk
     headless::HeadlessHost host_;
     std::vector<std::unique_ptr<headless::HostObject>> siblings_;
+    std::vector<std::unique_ptr<headless::MemoryRecordset>> recordsets_;
     std::vector<std::unique_ptr<frame::Object>> modules_;
     std::vector<frame::Object*> sharedModules_;                 // those that the controls of the host share
     std::map<std::string, std::shared_ptr<Handler>> handlers_;  // by object and event, in lower case

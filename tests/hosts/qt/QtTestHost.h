@@ -12,11 +12,13 @@
 #include "frame/Text.h"
 #include "hosts/headless/HeadlessHost.h"
 #include "hosts/qt/Convert.h"
+#include "hosts/qt/DataList.h"
 #include "hosts/qt/FileView.h"
 #include "hosts/qt/FolderView.h"
 #include "hosts/qt/Form.h"
 #include "hosts/qt/Host.h"
 #include "hosts/qt/Link.h"
+#include "hosts/qt/ScoreCard.h"
 #include "hosts/qt/Services.h"
 #include "hosts/qt/Splitter.h"
 #include "tests/hosts/qt/OwnerWidget.h"
@@ -204,9 +206,11 @@ class QtTestHost {
         return controls::FindControlClass(C::table.name);
     }
     ControlWidget& Make(const frame::ControlClass& controlClass, const headless::Placing& placing) {
+        if (controlClass.table->name == "DataList") return Placed<DataList>(placing);
         if (controlClass.table->name == "FileView") return Placed<FileView>(placing);
         if (controlClass.table->name == "FolderView") return Placed<FolderView>(placing);
         if (controlClass.table->name == "Link") return Placed<Link>(placing);
+        if (controlClass.table->name == "ScoreCard") return Placed<ScoreCard>(placing);
         if (controlClass.table->name == "Splitter") return Placed<Splitter>(placing);
         throw frame::ControlError(frame::errors::notSupported);
     }

@@ -636,5 +636,43 @@ TEST_F(SessionTest, AWidthBeyondAllScreensWrapsNothing) {
     EXPECT_EQ(Get("Link1.Label1", "Height"), "195.0");
 }
 
+TEST_F(SessionTest, ARecordsetFillsAList) {
+    EXPECT_EQ(Answer(R"({"do":"recordset","name":"RS1","columns":["Name","Id"],"rows":[["Red",1],["",2],["Blue",40000]]})"),
+              R"({"value":{"object":"RS1"},"log":[]})");
+    EXPECT_EQ(Value(R"({"do":"create","class":"DataList","name":"DataList1","mode":"run"})"), "\"DataList1\"");
+    EXPECT_EQ(Answer(R"({"do":"call","of":"DataList1","name":"Populate","args":[{"object":"RS1"},"name",1]})"),
+              R"({"value":"","log":[["yield"]]})");
+    EXPECT_EQ(Get("DataList1", "ListCount"), "2");
+    EXPECT_EQ(Value(R"~({"do":"get","of":"DataList1.listItems(0)","name":"List","args":[1]})~"), "\"Blue\"");
+    EXPECT_EQ(Value(R"~({"do":"get","of":"DataList1.listItems(0)","name":"ItemData","args":[1]})~"), "40000");
+    EXPECT_EQ(Answer(R"~({"do":"put","of":"DataList1.listItems(0)","name":"ListIndex","value":1})~"),
+              R"({"value":null,"log":[["event","DataList1","Click",[]]]})");
+    EXPECT_EQ(Get("DataList1", "Value"), "40000");
+    EXPECT_EQ(Get("DataList1.labItem", "Caption"), "\"Blue\"");
+    EXPECT_EQ(Get("RS1", "EOF"), "true");
+    EXPECT_EQ(Get("RS1.Fields(\"id\")", "Name"), "\"Id\"");
+}
+
+TEST_F(SessionTest, ARecordsetOfTheSameNameReplacesTheOldOne) {
+    EXPECT_EQ(Value(R"({"do":"recordset","name":"RS1","columns":["a"],"rows":[[1]]})"), R"({"object":"RS1"})");
+    EXPECT_EQ(Value(R"({"do":"recordset","name":"rs1","columns":["a"],"rows":[]})"), R"({"object":"rs1"})");
+    EXPECT_EQ(Value(R"({"do":"call","of":"RS1","name":"MoveFirst"})"), "error 3021");
+    MakeLink();
+    EXPECT_EQ(Value(R"({"do":"recordset","name":"Link1","columns":["a"],"rows":[]})"), "error 457");
+    EXPECT_EQ(Value(R"({"do":"recordset","name":"RS2","columns":["a"],"rows":[[1,2]]})"), "error 5");
+    EXPECT_EQ(Value(R"({"do":"recordset","name":"RS2","columns":["a"],"rows":[1]})"), "error 5");
+    EXPECT_EQ(Value(R"({"do":"recordset","columns":[],"rows":[]})"), "error 5");
+}
+
+TEST_F(SessionTest, ToolTipTextIsWrittenTwiceBehindTheBagOfAList) {
+    EXPECT_EQ(Value(R"({"do":"create","class":"DataList","name":"DataList1","mode":"run"})"), "\"DataList1\"");
+    const Json reply = Reply(R"({"do":"save","of":"DataList1"})");
+    const Json& written = reply["value"]["written"];
+    ASSERT_EQ(written.size(), 17u);
+    EXPECT_EQ(written[15].dump(), R"(["ToolTipText","",null])");
+    EXPECT_EQ(written[16].dump(), R"(["ToolTipText","",""])");
+    EXPECT_EQ(reply["value"]["bag"].dump(), "{}");
+}
+
 }  // namespace
 }  // namespace tessel::tools
