@@ -204,7 +204,6 @@ class Stage {
     void Forget() {
         deeds.clear();
         canvas.operations.clear();
-        repaints = 0;
     }
 
     /// What was set and raised, in order: "Splitter1.Top=500", "Text1.Height=900", "changed Orientation", "AfterMove(0, 100)". The
@@ -227,7 +226,6 @@ class Stage {
     bool designTime = false;
     headless::HeadlessHost others;  ///< lends the services that these tests do not watch
     frame::RecordingCanvas canvas;  ///< what the bar draws
-    int repaints = 0;
     Thing form{deeds, "Form1", {{"Name", "Form1"}, {"ScaleWidth", 6000.0f}, {"ScaleHeight", 4000.0f}}};
     frame::Object* parent = &form;
     std::vector<frame::Object*> standing;  ///< what stands on the form; null is one that cannot be had
@@ -306,7 +304,6 @@ class Stage {
             if (const auto handler = stage.onPropertyChanged) handler(key);
         }
         frame::EventSink& Events() override { return sink; }
-        void Repaint() override { ++stage.repaints; }
 
         Stage& stage;
         Ambients ambient{stage};
