@@ -1,36 +1,59 @@
 #include "apps/gallery/BrowserPage.h"
 
 #include <QAction>
-#include <QComboBox>
 #include <QDesktopServices>
 #include <QDir>
+#include <QEvent>
 #include <QFileInfo>
 #include <QHBoxLayout>
 #include <QLabel>
-#include <QLineEdit>
 #include <QPointer>
 #include <QScopedValueRollback>
 #include <QSettings>
-#include <QSplitter>
 #include <QStandardPaths>
 #include <QTemporaryDir>
 #include <QTimer>
 #include <QToolButton>
 #include <QUrl>
 #include <QVBoxLayout>
+#include <algorithm>
 
 #include "apps/gallery/FileStatus.h"
 #include "apps/gallery/Sample.h"
 #include "hosts/qt/Convert.h"
+#include "hosts/qt/Host.h"
 
 namespace tessel::gallery {
+
+namespace {
+
+constexpr int barWidth = 8, leastPane = 120;
+
+struct Filter {
+    const char* text;
+    const char* pattern;
+};
+/// In the order of their values in the list.
+constexpr Filter filters[] = {
+    {QT_TRANSLATE_NOOP("BrowserPage", "Everything"), ""},
+    {QT_TRANSLATE_NOOP("BrowserPage", "Texts (*.txt)"), "*.txt"},
+    {QT_TRANSLATE_NOOP("BrowserPage", "Documents (*.pdf)"), "*.pdf"},
+    {QT_TRANSLATE_NOOP("BrowserPage", "Photographs (*.jpg)"), "*.jpg"},
+    {QT_TRANSLATE_NOOP("BrowserPage", "Sources (*.[ch]*)"), "*.[ch]*"},
+};
+
+QString PatternOf(int value) {
+    return value >= 0 && value < static_cast<int>(std::size(filters)) ? filters[value].pattern : QString();
+}
+
+}  // namespace
 
 BrowserPage::BrowserPage(const QString& stateFile, QWidget* parent) : Page(parent), stateFile_(stateFile) {
     if (stateFile_.isEmpty()) stateFile_ = QStandardPaths::writableLocation(QStandardPaths::AppConfigLocation) + "/browser.ini";
     makePanes();
     auto* column = new QVBoxLayout(this);
     column->addLayout(makeTopRow());
-    column->addWidget(splitter_, 1);
+    column->addWidget(area_, 1);
     column->addWidget(status_);
     restore();
 
@@ -60,16 +83,13 @@ QLayout* BrowserPage::makeTopRow() {
     link_->setObjectName("browserLink");
     link_->setFont(font());
 
-    filter_ = new QComboBox;
+    filter_ = new qt::DataList;
     filter_->setObjectName("browserFilter");
-    filter_->setEditable(true);
-    filter_->addItems({"*", "*.txt", "*.pdf", "*.jpg", "*.[ch]*"});
+    filter_->setFont(font());
     filter_->setAccessibleName(tr("Filter"));
+    for (int value = 0; value < static_cast<int>(std::size(filters)); ++value) filter_->addItem(tr(filters[value].text), value);
     auto* caption = new QLabel(tr("&Filter:"));
     caption->setBuddy(filter_);
-    const auto filterChosen = [this] { list(folder_); };
-    connect(filter_, &QComboBox::textActivated, this, filterChosen);
-    connect(filter_->lineEdit(), &QLineEdit::editingFinished, this, filterChosen);
 
     row->addWidget(up_);
     row->addWidget(link_, 1, Qt::AlignVCenter);
@@ -79,18 +99,42 @@ QLayout* BrowserPage::makeTopRow() {
 }
 
 void BrowserPage::makePanes() {
-    splitter_ = new QSplitter;
-    splitter_->setChildrenCollapsible(false);
-    tree_ = new qt::FolderView;
+    area_ = new QWidget;
+    area_->setObjectName("browserArea");
+    qt::Host::setForm(area_);
+    area_->installEventFilter(this);
+    tree_ = new qt::FolderView(area_);
     tree_->setObjectName("browserTree");
-    files_ = new qt::FileView;
+    bar_ = new qt::Splitter(area_);
+    bar_->setObjectName("browserBar");
+    bar_->setAccessibleName(tr("Between folders and files"));
+    bar_->setOrientation(qt::Splitter::tsVertical);
+    constexpr double least = leastPane * static_cast<double>(frame::twipsPerPixel);
+    bar_->setMinTopLeft(least);
+    bar_->setMinBottomRight(least);
+    files_ = new qt::FileView(area_);
     files_->setObjectName("browserFiles");
-    splitter_->addWidget(tree_);
-    splitter_->addWidget(files_);
-    constexpr int treeWidth = 230, listWidth = 560;
-    splitter_->setSizes({treeWidth, listWidth});
-    splitter_->setStretchFactor(1, 1);
+    connect(bar_, &qt::Splitter::afterMove, this, [this] { treeWidth_ = tree_->width(); });
     status_ = new FileStatus(files_);
+}
+
+bool BrowserPage::eventFilter(QObject* watched, QEvent* event) {
+    if (watched == area_ && (event->type() == QEvent::Resize || event->type() == QEvent::LayoutDirectionChange)) layOut();
+    return Page::eventFilter(watched, event);
+}
+
+void BrowserPage::layOut() {
+    const bool mirrored = area_->layoutDirection() == Qt::RightToLeft;
+    QWidget* const first = mirrored ? static_cast<QWidget*>(files_) : tree_;
+    QWidget* const second = mirrored ? static_cast<QWidget*>(tree_) : files_;
+    const int width = area_->width(), height = area_->height();
+    const int tree = std::clamp(treeWidth_, leastPane, std::max(width - leastPane - barWidth, leastPane));
+    const int at = mirrored ? std::max(width - tree - barWidth, 0) : tree;
+    bar_->setControlsTopLeft(first->objectName());
+    bar_->setControlsBottomRight(second->objectName());
+    first->setGeometry(0, 0, at, height);
+    bar_->setGeometry(at, 0, barWidth, height);
+    second->setGeometry(at + barWidth, 0, std::max(width - at - barWidth, 0), height);
 }
 
 void BrowserPage::restore() {
@@ -107,8 +151,9 @@ void BrowserPage::restore() {
     files_->setMultiSelect(true);
     files_->setFullRowSelect(true);
     files_->setLimitToRoot(false);
-    splitter_->restoreState(state.value("splitter").toByteArray());
-    filter_->setCurrentText(state.value("filter", "*").toString());
+    treeWidth_ = state.value("treeWidth", treeWidth_).toInt();
+    filter_->setValue(state.value("filter").toInt());
+    connect(filter_, &qt::DataList::click, this, [this] { list(folder_); });
     folder_ = state.value("folder").toString();
     if (!QFileInfo(folder_).isDir()) folder_ = QDir::homePath();
     // A tree is built anew whenever it is shown, and begins at its root.
@@ -134,8 +179,8 @@ void BrowserPage::save() const {
     QSettings state(stateFile_, QSettings::IniFormat);
     state.setValue("tree", tree_->bag());
     state.setValue("files", files_->bag());
-    state.setValue("splitter", splitter_->saveState());
-    state.setValue("filter", filter_->currentText());
+    state.setValue("treeWidth", treeWidth_);
+    state.setValue("filter", filter_->value());
     state.setValue("folder", folder_);
 }
 
@@ -160,8 +205,7 @@ void BrowserPage::listNow() {
     listing_ = true;
     while (alive && due_) {
         due_ = false;
-        const QString pattern = filter_->currentText().trimmed();
-        files_->setFilter(pattern == "*" ? QString() : pattern);
+        files_->setFilter(PatternOf(filter_->value()));
         files_->setPath(folder_);
         files_->setShowFolders(files_->showFolders());  // lists anew
     }

@@ -3,14 +3,13 @@
 #include <memory>
 
 #include "apps/gallery/Page.h"
+#include "hosts/qt/DataList.h"
 #include "hosts/qt/FileView.h"
 #include "hosts/qt/FolderView.h"
 #include "hosts/qt/Link.h"
+#include "hosts/qt/Splitter.h"
 
-class QComboBox;
 class QLayout;
-class QSettings;
-class QSplitter;
 class QTemporaryDir;
 class QToolButton;
 
@@ -18,7 +17,8 @@ namespace tessel::gallery {
 
 class FileStatus;
 
-/// A file manager: a tree of folders and a list of files side by side, each following the other. It begins where it was left.
+/// A file manager: a tree of folders and a list of files side by side with a bar between, each following the other, a list of
+/// filters, and a link to the folder. It begins where it was left.
 class BrowserPage final : public Page {
     Q_OBJECT
 
@@ -31,9 +31,14 @@ class BrowserPage final : public Page {
     QString hint() const override { return tr("A folder chosen on either side is shown on the other. Alt+Up goes up."); }
     void pose(const QString& name) override;
 
+  protected:
+    bool eventFilter(QObject* watched, QEvent* event) override;
+
   private:
     QLayout* makeTopRow();
     void makePanes();
+    /// Gives the panes the whole area; the tree keeps its width as far as there is room.
+    void layOut();
     void restore();
     void save() const;
 
@@ -49,14 +54,16 @@ class BrowserPage final : public Page {
     QString stateFile_;
     QToolButton* up_ = nullptr;
     qt::Link* link_ = nullptr;
-    QComboBox* filter_ = nullptr;
-    QSplitter* splitter_ = nullptr;
+    qt::DataList* filter_ = nullptr;
+    QWidget* area_ = nullptr;  // the form of the bar, without a layout
+    qt::Splitter* bar_ = nullptr;
     qt::FolderView* tree_ = nullptr;
     qt::FileView* files_ = nullptr;
     FileStatus* status_ = nullptr;
     std::unique_ptr<QTemporaryDir> sample_;
 
     QString folder_;  // that is shown or about to be
+    int treeWidth_ = 230;
     bool due_ = false, listing_ = false, revealing_ = false, rebuilt_ = false;
 };
 

@@ -69,20 +69,29 @@ std::string DataList::Populate(const frame::ObjectRef& ListRecordset, const Vari
     for (ComboList& list : listItems) list.Clear();
     own.itemCounter = 0;
     if (DefaultText) AddDefaultPair(*DefaultText, DefaultValue);
-    // A row that cannot be read is passed over; a source that cannot go on would never reach its end.
-    ResumeNext walk;
-    std::string text;
-    const auto atEnd = [&] { return walk.If([&] { return records->AtEnd(); }); };
-    while (!atEnd() && !walk.Failed()) {
-        next([&] {
-            records->Text(textColumn, text);
-            AddText(text, records->Value(valueColumn));
-        });
-        walk([&] { records->MoveNext(); });
-    }
+    const std::string why = AddRows(*records, textColumn, valueColumn);
     Host().Turn();
     own.busy = false;
-    return walk.Description();
+    return why;
+}
+
+/// In resume-next mode a test for the end that fails goes on with the row, and after a step that fails the row comes again. The
+/// second of two failures with no sound row between them ends the walk, which would have no end, and its words are given.
+std::string DataList::AddRows(frame::RecordReader& records, std::size_t textColumn, std::size_t valueColumn) {
+    constexpr int tooMany = 2;
+    std::string text;
+    for (int failures = 0;;) {
+        ResumeNext test, row, step;
+        if (test.Value([&] { return records.AtEnd(); }, false)) return {};
+        if (test.Failed() && ++failures == tooMany) return test.Description();
+        row([&] {
+            records.Text(textColumn, text);
+            AddText(text, records.Value(valueColumn));
+        });
+        step([&] { records.MoveNext(); });
+        if (step.Failed() && ++failures == tooMany) return step.Description();
+        if (!test.Failed() && !step.Failed()) failures = 0;
+    }
 }
 
 /// The value is taken to 16 bits: one that does not fit leaves the one that was there.
@@ -408,13 +417,13 @@ struct DataList::Tables {
         &datalist::Click, &datalist::DblClick,      &datalist::KeyDown,       &datalist::KeyPress,
         &datalist::KeyUp, &frame::stock::MouseDown, &frame::stock::MouseMove, &frame::stock::MouseUp};
 
-    /// Kept as it was loaded, and saved from the public property.
+    /// Kept as it was loaded, whatever it is, and saved from the public property.
     static constexpr frame::BagKey value{
         "Value",
         frame::ValueDefault(VarType::Integer, 0),
         frame::ValueDefault(VarType::Integer, 0),
         true,
-        [](Control& control, const Variant& loaded) { static_cast<DataList&>(control).own.Value = loaded.ToLong(); },
+        [](Control& control, const Variant& loaded) { static_cast<DataList&>(control).own.Value = loaded; },
         [](const Control& control) -> Variant { return static_cast<const DataList&>(control).Value(); }};
     static constexpr std::array kept = {
         frame::key<&DataList::own, &Own::Locked>("Locked", VarType::Boolean, false),

@@ -93,9 +93,9 @@ void Form::Watch(QWidget& widget) {
 bool Form::eventFilter(QObject* /*watched*/, QEvent* event) {
     switch (event->type()) {
         case QEvent::ChildAdded:
-        case QEvent::ChildRemoved:
             if (static_cast<QChildEvent*>(event)->child()->isWidgetType()) ForgetMembers();
             break;
+        case QEvent::ChildRemoved:  // of a child that has gone it is not told whether it was a widget
         case QEvent::ParentChange:
             ForgetMembers();
             break;
@@ -122,8 +122,8 @@ bool Form::IsOfThisForm(const Member& member) const {
 void Form::LookInto(QWidget& parent, std::unordered_set<const QWidget*>& known) {
     for (QObject* child : parent.children()) {
         auto* widget = qobject_cast<QWidget*>(child);
-        if (!widget) continue;
-        Watch(*widget);  // a window too: it may become a part
+        if (!widget || !QPointer(widget)) continue;  // nor one that is going
+        Watch(*widget);                              // a window too: it may become a part
         if (widget->isWindow() || Host::formOf(widget) == widget || widget->objectName().startsWith("qt_tessel_")) continue;
         const bool inner = widget->objectName().isEmpty() || widget->objectName().startsWith("qt_");
         if (!inner && known.insert(widget).second) {

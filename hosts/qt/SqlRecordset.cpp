@@ -11,40 +11,9 @@ namespace tessel::qt {
 using frame::ControlError;
 using frame::Variant;
 
-SqlRecordset::SqlRecordset(const QString& table, const QSqlDatabase& database) : own_(database), query_(own_) {
-    const QString name = database.driver()->escapeIdentifier(table, QSqlDriver::TableName);
-    own_.setForwardOnly(true);
-    own_.prepare("SELECT * FROM " + name);
-}
+namespace {
 
-void SqlRecordset::MoveFirst() {
-    const bool fresh = query_.isActive() && query_.isSelect() && query_.at() == QSql::BeforeFirstRow;
-    if (!fresh && (!query_.isActive() || query_.isForwardOnly())) Run();
-    const bool found = query_.isForwardOnly() ? query_.next() : query_.first();
-    if (!found && query_.lastError().isValid()) Fail();
-    atEnd_ = !found;
-    WantRow();
-}
-
-void SqlRecordset::Run() {
-    record_ = {};
-    query_.setForwardOnly(true);
-    const bool done = query_.boundValues().isEmpty() ? query_.exec(query_.lastQuery()) : query_.exec();
-    if (!done) Fail();
-}
-
-void SqlRecordset::MoveNext() {
-    WantRow();
-    if (query_.next()) return;
-    atEnd_ = true;
-    if (query_.lastError().isValid()) Fail();
-}
-
-std::string SqlRecordset::FieldName(std::int32_t field) { return FromQt(Record().fieldName(field)); }
-
-Variant SqlRecordset::FieldValue(std::int32_t field) {
-    WantRow();
-    const QVariant value = query_.value(field);
+Variant FromSql(const QVariant& value) {
     if (value.isNull()) return {};
     switch (value.typeId()) {
         case QMetaType::QString:
@@ -56,11 +25,55 @@ Variant SqlRecordset::FieldValue(std::int32_t field) {
     }
 }
 
+}  // namespace
+
+SqlRecordset::SqlRecordset(const QString& table, const QSqlDatabase& database) : own_(database), query_(own_) {
+    const QString name = database.driver()->escapeIdentifier(table, QSqlDriver::TableName);
+    own_.setForwardOnly(true);
+    own_.prepare("SELECT * FROM " + name);
+}
+
+void SqlRecordset::MoveFirst() {
+    const bool fresh = query_.isActive() && query_.isSelect() && query_.at() == QSql::BeforeFirstRow;
+    if (!fresh && (!query_.isActive() || query_.isForwardOnly())) Run();
+    hasRow_ = query_.isForwardOnly() ? query_.next() : query_.first();
+    if (!hasRow_ && query_.lastError().isValid()) Fail();
+    atEnd_ = !hasRow_;
+    WantRow();
+}
+
+void SqlRecordset::Run() {
+    record_ = {};
+    hasRow_ = false;
+    query_.setForwardOnly(true);
+    const bool done = query_.boundValues().isEmpty() ? query_.exec(query_.lastQuery()) : query_.exec();
+    if (!done) Fail();
+}
+
+void SqlRecordset::MoveNext() {
+    if (atEnd_) WantRow();
+    hasRow_ = query_.next();
+    if (hasRow_) return;
+    // After a failure it does not stand at the end: the next attempt fails too.
+    if (query_.lastError().isValid()) Fail();
+    atEnd_ = true;
+}
+
+std::string SqlRecordset::FieldName(std::int32_t field) { return FromQt(Record().fieldName(field)); }
+
+Variant SqlRecordset::FieldValue(std::int32_t field) {
+    WantRow();
+    return FromSql(query_.value(field));
+}
+
 void SqlRecordset::FieldText(std::int32_t field, std::string& text) {
     constexpr ushort firstBeyondAscii = 0x80;
     WantRow();
     const QVariant value = query_.value(field);
-    if (value.typeId() != QMetaType::QString || value.isNull()) return frame::Recordset::FieldText(field, text);
+    if (value.typeId() != QMetaType::QString || value.isNull()) {
+        text = FromSql(value).ToText();
+        return;
+    }
     const auto& wide = *static_cast<const QString*>(value.constData());
     text.resize(static_cast<std::size_t>(wide.size()));
     const ushort* const from = wide.utf16();
@@ -75,7 +88,7 @@ void SqlRecordset::FieldText(std::int32_t field, std::string& text) {
 }
 
 void SqlRecordset::WantRow() const {
-    if (atEnd_ || !query_.isActive()) throw ControlError(frame::errors::noCurrentRow);
+    if (!hasRow_) throw ControlError(frame::errors::noCurrentRow);
 }
 
 void SqlRecordset::Fail() const {

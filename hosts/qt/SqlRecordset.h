@@ -16,7 +16,7 @@ namespace tessel::qt {
 class SqlRecordset final : public frame::Recordset {
   public:
     /// `query` must outlive the recordset, and stands where that leaves it.
-    explicit SqlRecordset(QSqlQuery& query) : query_(query) {}
+    explicit SqlRecordset(QSqlQuery& query) : query_(query), hasRow_(query.isValid()) {}
     /// All rows of a table.
     SqlRecordset(const QString& table, const QSqlDatabase& database);
 
@@ -37,7 +37,7 @@ class SqlRecordset final : public frame::Recordset {
     QSqlQuery own_;  // of a table
     QSqlQuery& query_;
     QSqlRecord record_;
-    bool atEnd_ = false;
+    bool hasRow_ = false, atEnd_ = false;
 };
 
 }  // namespace tessel::qt

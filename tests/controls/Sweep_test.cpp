@@ -431,7 +431,10 @@ TEST_P(Sweep, WhatWasSavedLoadsToTheSameSave) {
 }
 
 TEST_P(Sweep, AKeyThatDoesNotConvertFailsTheLoad) {
+    // They keep whatever they are given.
+    const std::set<std::pair<std::string_view, std::string_view>> keptAsTheyCame = {{"DataList", "Value"}, {"Splitter", "Ident"}};
     for (const frame::BagKey& key : Table().bag) {
+        if (keptAsTheyCame.contains({Table().name, key.name})) continue;
         if (key.onLoad.type == VarType::String || key.onLoad.type == VarType::Empty) continue;
         const auto bag = test::BagOf({{std::string(key.name), "no such value"}});
         EXPECT_NE(ErrorOf([&] { Make({.saved = &bag}); }), 0) << key.name;

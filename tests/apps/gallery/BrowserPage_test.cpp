@@ -8,9 +8,7 @@
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
-#include <QLineEdit>
 #include <QSettings>
-#include <QSplitter>
 #include <QTemporaryDir>
 #include <QTest>
 #include <QToolButton>
@@ -92,9 +90,8 @@ TEST_F(BrowserPageTest, EnteringAFolderInTheListMovesTheTree) {
 
 TEST_F(BrowserPageTest, TheFilterCountsForTheList) {
     Open();
-    auto* filter = page_->findChild<QComboBox*>("browserFilter");
-    filter->setEditText("*.pdf");
-    QTest::keyClick(filter->lineEdit(), Qt::Key_Return);
+    // Typed ahead: the documents.
+    QTest::keyClick(page_->findChild<qt::DataList*>("browserFilter")->findChild<QComboBox*>("listItems(0)"), Qt::Key_D);
     EXPECT_TRUE(QTest::qWaitFor([&] { return Files()->itemCount() == 1; }));
 }
 
@@ -110,13 +107,43 @@ TEST_F(BrowserPageTest, ItsStateComesBack) {
     ClickNode(folder_.filePath("letters"));
     ASSERT_TRUE(Shows(folder_.filePath("letters")));
     Files()->setView(qt::FileView::List);
-    page_->findChild<QSplitter*>()->setSizes({300, 500});
-    const QList<int> sizes = page_->findChild<QSplitter*>()->sizes();
+    page_->findChild<qt::Splitter*>("browserBar")->moveTo(300);
+    EXPECT_EQ(Tree()->width(), 300);
+    EXPECT_EQ(Files()->x(), 308);
+    page_->findChild<qt::DataList*>("browserFilter")->setValue(1);
     page_.reset();
     Open();
     EXPECT_TRUE(Shows(folder_.filePath("letters")));
     EXPECT_EQ(Files()->view(), qt::FileView::List);
-    EXPECT_EQ(page_->findChild<QSplitter*>()->sizes(), sizes);
+    EXPECT_EQ(Tree()->width(), 300);
+    EXPECT_EQ(page_->findChild<qt::DataList*>("browserFilter")->text(), "Texts (*.txt)");
+}
+
+TEST_F(BrowserPageTest, TheBarPartsTheTreeAndTheList) {
+    Open();
+    auto* bar = page_->findChild<qt::Splitter*>("browserBar");
+    const int width = Tree()->width() + bar->width() + Files()->width();
+    QTest::keyClick(bar, Qt::Key_Right);
+    EXPECT_EQ(bar->x(), Tree()->width());
+    EXPECT_EQ(Files()->x(), bar->x() + bar->width());
+    EXPECT_EQ(Tree()->width() + bar->width() + Files()->width(), width);
+    const int tree = Tree()->width();
+    page_->resize(page_->width() + 100, page_->height());
+    QApplication::processEvents();
+    EXPECT_EQ(Tree()->width(), tree);
+    EXPECT_EQ(Tree()->width() + bar->width() + Files()->width(), width + 100);
+}
+
+TEST_F(BrowserPageTest, FromRightToLeftTheTreeStandsOnTheRight) {
+    Open();
+    page_->setLayoutDirection(Qt::RightToLeft);
+    QApplication::processEvents();
+    auto* bar = page_->findChild<qt::Splitter*>("browserBar");
+    EXPECT_EQ(Files()->x(), 0);
+    EXPECT_EQ(Tree()->x(), bar->x() + bar->width());
+    QTest::keyClick(bar, Qt::Key_Left);
+    EXPECT_EQ(Files()->width(), bar->x());
+    EXPECT_EQ(Tree()->x(), bar->x() + bar->width());
 }
 
 TEST_F(BrowserPageTest, AFolderThatHasGoneAndADamagedStateBeginAtHome) {

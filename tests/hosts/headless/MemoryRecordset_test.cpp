@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <array>
+#include <set>
 #include <string>
 #include <utility>
 #include <vector>
@@ -111,10 +112,13 @@ class Foreign final : public frame::Object {
 
     void MoveFirst() { at_ = 0; }
     void MoveNext() {
-        if (at_ == failsAfter) throw frame::ControlError(3146, "the line is cut");
+        if (at_ == failsAfter || failingMoves.count(++moves_)) throw frame::ControlError(3146, "the line is cut");
         ++at_;
     }
-    bool End() const { return at_ >= count_; }
+    bool End() {
+        if (failingTests.count(++tests_)) throw frame::ControlError(3146, "nobody knows");
+        return at_ >= count_;
+    }
     frame::ObjectRef Fields(const Variant& index) { return frame::ObjectRef(index.ToText() == "n" ? number_ : text_); }
 
     const frame::ClassTable& Table() const override {
@@ -126,6 +130,7 @@ class Foreign final : public frame::Object {
     }
 
     int failsAfter = -1;
+    std::set<int> failingMoves, failingTests;  // which of them, from 1
 
   private:
     struct Cell final : frame::Object {
@@ -144,7 +149,7 @@ class Foreign final : public frame::Object {
         bool number;
     };
 
-    int count_, at_ = 0;
+    int count_, at_ = 0, moves_ = 0, tests_ = 0;
     Cell number_{*this, true}, text_{*this, false};
 };
 
@@ -158,7 +163,34 @@ TEST_F(Populating, ASourceThatCannotGoOnEndsTheFillAndTellsWhy) {
     Foreign records(5);
     records.failsAfter = 2;
     EXPECT_EQ(Fill(records, "t", "n"), "the line is cut");
-    EXPECT_EQ(Items(), "row 0=0, row 1=1, row 2=2");
+    EXPECT_EQ(Items(), "row 0=0, row 1=1, row 2=2, row 2=2");
+}
+
+TEST_F(Populating, FailuresWithSoundRowsBetweenThemDoNotEndTheFill) {
+    Foreign records(4);
+    records.failingMoves = {2, 4, 6};
+    EXPECT_EQ(Fill(records, "t", "n"), "");
+    EXPECT_EQ(Items(), "row 0=0, row 1=1, row 1=1, row 2=2, row 2=2, row 3=3, row 3=3");
+    Foreign twice(4);
+    twice.failingMoves = {2, 3};
+    EXPECT_EQ(Fill(twice, "t", "n"), "the line is cut");
+    EXPECT_EQ(Items(), "row 0=0, row 1=1, row 1=1");
+}
+
+TEST_F(Populating, ATestForTheEndThatFailsTwiceWithoutASoundRowBetweenEndsTheFill) {
+    Foreign records(4);
+    records.failingTests = {1, 3};
+    EXPECT_EQ(Fill(records, "t", "n"), "");
+    EXPECT_EQ(Items(), "row 0=0, row 1=1, row 2=2, row 3=3");
+    Foreign twice(4);
+    twice.failingTests = {2, 3};
+    EXPECT_EQ(Fill(twice, "t", "n"), "nobody knows");
+    EXPECT_EQ(Items(), "row 0=0, row 1=1");
+    Foreign both(4);
+    both.failingTests = {2};
+    both.failingMoves = {2};
+    EXPECT_EQ(Fill(both, "t", "n"), "the line is cut");
+    EXPECT_EQ(Items(), "row 0=0, row 1=1");
 }
 
 TEST_F(Populating, RowsBeyondTheItemCounterAreAddedUnderItsLastNumber) {

@@ -188,6 +188,21 @@ TEST_P(SqlRecordsetTest, ValuesComeInTheirKindAndNullIsEmpty) {
     EXPECT_EQ(records.Fields("share")->Value().ToDouble(), 2);
 }
 
+TEST_P(SqlRecordsetTest, AQueryThatStandsOnARowIsReadFromThere) {
+    QSqlQuery query(all, database);
+    SqlRecordset before(query);
+    EXPECT_EQ(ErrorOf([&] { before.FieldValue(0); }), frame::errors::noCurrentRow);
+    ASSERT_TRUE(query.next());
+    ASSERT_TRUE(query.next());
+    SqlRecordset records(query);
+    EXPECT_EQ(records.FieldValue(0).ToLong(), 2);
+    records.MoveNext();
+    EXPECT_EQ(records.FieldValue(0).ToLong(), 3);
+    std::string text;
+    records.FieldText(0, text);
+    EXPECT_EQ(text, "3");
+}
+
 TEST_P(SqlRecordsetTest, WithoutRowsMoveFirstFails) {
     QSqlQuery query("SELECT name FROM colours WHERE id > 100", database);
     SqlRecordset records(query);
@@ -203,6 +218,18 @@ TEST_P(SqlRecordsetTest, TheWordsOfTheDatabaseComeBack) {
     QSqlQuery query(database);
     query.exec("SELECT nonsense FROM colours");
     EXPECT_TRUE(list.populate(query, "name", "id").contains("nonsense"));
+}
+
+TEST_P(SqlRecordsetTest, WhatFailsOnTheWayEndsTheFillWithTheWordsOfTheDatabase) {
+    if (GetParam() != Kind::SQLite) GTEST_SKIP() << "the server works out all rows before the first one comes";
+    QSqlQuery query(database);
+    query.setForwardOnly(true);
+    ASSERT_TRUE(
+        query.exec("WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < 9) "
+                   "SELECT i, CASE i WHEN 3 THEN abs(i - 4 - 9223372036854775807) ELSE 'row ' || i END AS t FROM n"));
+    DataList list;
+    EXPECT_TRUE(list.populate(query, "t", "i").contains("overflow"));
+    EXPECT_EQ(list.listCount(), 2);
 }
 
 TEST_P(SqlRecordsetTest, AListIsFilledInOneLine) {
