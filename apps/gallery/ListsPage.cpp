@@ -2,9 +2,11 @@
 
 #include <QCheckBox>
 #include <QComboBox>
-#include <QFormLayout>
+#include <QGridLayout>
+#include <QGroupBox>
 #include <QHBoxLayout>
 #include <QLabel>
+#include <QPlainTextEdit>
 #include <QSqlQuery>
 #include <QVBoxLayout>
 
@@ -18,15 +20,9 @@ ListsPage::ListsPage(QWidget* parent) : Page(parent) {
     problem_->setObjectName("problem");
     problem_->setWordWrap(true);
     problem_->hide();
-    auto* form = new QFormLayout;
-    form->setFieldGrowthPolicy(QFormLayout::ExpandingFieldsGrow);
-    countries_ = makeRow(form, tr("&Country:"), "countries");
-    subdivisions_ = makeRow(form, tr("&Subdivision:"), "subdivisions");
-    languages_ = makeRow(form, tr("&Language:"), "languages");
     column->addWidget(problem_);
-    column->addLayout(form);
-    column->addLayout(makeChoices());
-    column->addStretch(1);
+    column->addWidget(makeLists());
+    column->addWidget(makeLog(), 1);
     connect(countries_.list, &qt::DataList::click, this, &ListsPage::fillSubdivisions);
     say(OpenIsoCodes(database_));
     fill();
@@ -38,19 +34,36 @@ ListsPage::~ListsPage() {
     QSqlDatabase::removeDatabase(name);
 }
 
-ListsPage::Row ListsPage::makeRow(QFormLayout* form, const QString& caption, const char* name) {
-    const Row row{new qt::DataList, new QLabel};
+QWidget* ListsPage::makeLists() {
+    auto* box = new QGroupBox(tr("Pairs from a database"));
+    auto* column = new QVBoxLayout(box);
+    auto* grid = new QGridLayout;
+    constexpr int listColumn = 1, saysColumn = 2;
+    grid->setColumnStretch(listColumn, 1);
+    grid->setColumnStretch(saysColumn, 1);
+    countries_ = makeRow(grid, tr("&Country:"), "countries");
+    subdivisions_ = makeRow(grid, tr("&Subdivision:"), "subdivisions");
+    languages_ = makeRow(grid, tr("&Language:"), "languages");
+    column->addLayout(grid);
+    column->addLayout(makeChoices());
+    return box;
+}
+
+ListsPage::Row ListsPage::makeRow(QGridLayout* grid, const QString& caption, const char* name) {
+    const Row row{new QLabel(caption), new qt::DataList, new QLabel};
     row.list->setObjectName(name);
     row.list->setFont(font());
     row.list->setAccessibleName(QString(caption).remove('&').remove(':'));
     row.says->setTextInteractionFlags(Qt::TextSelectableByMouse);
-    auto* line = new QVBoxLayout;
-    line->addWidget(row.list);
-    line->addWidget(row.says);
-    auto* label = new QLabel(caption);
-    label->setBuddy(row.list);
-    form->addRow(label, line);
+    row.says->setForegroundRole(QPalette::PlaceholderText);
+    row.list->setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Fixed);
+    row.caption->setBuddy(row.list);
+    const int place = grid->rowCount();
+    grid->addWidget(row.caption, place, 0);
+    grid->addWidget(row.list, place, 1);
+    grid->addWidget(row.says, place, 2);
     connect(row.list, &qt::DataList::click, this, [this, row] { tell(row); });
+    listen(row.list);
     return row;
 }
 
@@ -79,6 +92,30 @@ QLayout* ListsPage::makeChoices() {
     return line;
 }
 
+QWidget* ListsPage::makeLog() {
+    auto* box = new QGroupBox(tr("Events"));
+    auto* column = new QVBoxLayout(box);
+    constexpr int mostLines = 1000;
+    log_ = new QPlainTextEdit;
+    log_->setReadOnly(true);
+    log_->setMaximumBlockCount(mostLines);
+    log_->setPlaceholderText(tr("What the lists tell their program: open one, type, choose."));
+    column->addWidget(log_);
+    return box;
+}
+
+void ListsPage::listen(qt::DataList* list) {
+    connect(list, &qt::DataList::click, this, [this, list] { log(list->objectName() + ": Click"); });
+    connect(list, &qt::DataList::dblClick, this, [this, list] { log(list->objectName() + ": DblClick"); });
+    connect(list, &qt::DataList::keyDown, this, [this, list](short& code, short& shift) {
+        log(QString("%1: KeyDown %2 %3").arg(list->objectName()).arg(code).arg(shift));
+    });
+}
+
+void ListsPage::log(const QString& line) {
+    if (log_) log_->appendPlainText(line);
+}
+
 void ListsPage::fill() {
     if (!database_.isOpen() || !problem_->text().isEmpty()) return;
     const int country = countries_.list->value(), subdivision = subdivisions_.list->value(), language = languages_.list->value();
@@ -87,6 +124,9 @@ void ListsPage::fill() {
         row.list->setLocked(locked_->isChecked());
         // Set even where it stays as it was: that shows what is locked. The items come anew.
         row.list->setSorted(sorted_->isChecked());
+        // The label of a locked list has its text at the top.
+        for (QLabel* label : {row.caption, row.says})
+            label->setAlignment(Qt::AlignLeading | (locked_->isChecked() ? Qt::AlignTop : Qt::AlignVCenter));
     }
     say(countries_.list->populate("countries", database_, "name", "id", defaultText(), 0));
     say(languages_.list->populate("languages", database_, "name", "id", defaultText(), 0));
@@ -126,6 +166,7 @@ void ListsPage::pose(const QString& name) {
     fillSubdivisions();
     languages_.list->setValue(firstLanguage);
     locked_->setChecked(name == "locked");
+    log_->clear();
     for (const Row& row : {countries_, subdivisions_, languages_}) tell(row);
 }
 

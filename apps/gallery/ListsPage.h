@@ -7,8 +7,9 @@
 
 class QCheckBox;
 class QComboBox;
-class QFormLayout;
+class QGridLayout;
 class QLabel;
+class QPlainTextEdit;
 
 namespace tessel::gallery {
 
@@ -28,11 +29,16 @@ class ListsPage final : public Page {
   private:
     /// A list with what it has to say beside it.
     struct Row {
+        QLabel* caption = nullptr;
         qt::DataList* list = nullptr;
         QLabel* says = nullptr;
     };
-    Row makeRow(QFormLayout* form, const QString& caption, const char* name);
+    QWidget* makeLists();
+    Row makeRow(QGridLayout* grid, const QString& caption, const char* name);
     QLayout* makeChoices();
+    QWidget* makeLog();
+    void listen(qt::DataList* list);
+    void log(const QString& line);
 
     void fill();
     void fillSubdivisions();
@@ -47,6 +53,7 @@ class ListsPage final : public Page {
     QCheckBox* defaults_ = nullptr;
     QComboBox* style_ = nullptr;
     QLabel* problem_ = nullptr;
+    QPlainTextEdit* log_ = nullptr;
 };
 
 }  // namespace tessel::gallery

@@ -210,9 +210,11 @@ void PanesPage::pose(const QString& name) {
     rightPart_ = name == "raised" ? 0.65 : 0.45;
     layOut();
     if (name == "raised") middle_->setFocus(Qt::TabFocusReason);
-    if (name != "serrated") return;
     auto& surface = right_->control().Surface();
-    surface.MouseMoveInput(0, 0, surface.Width() / 2, surface.Height() / 2);
+    if (name == "serrated")
+        surface.MouseMoveInput(0, 0, surface.Width() / 2, surface.Height() / 2);
+    else
+        surface.MouseMoveInput(0, 0, 0, 0);
 }
 
 }  // namespace tessel::gallery

@@ -3,6 +3,7 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDoubleSpinBox>
+#include <QEvent>
 #include <QFormLayout>
 #include <QGridLayout>
 #include <QGroupBox>
@@ -141,6 +142,11 @@ void ScoresPage::showEvent(QShowEvent* event) {
 void ScoresPage::hideEvent(QHideEvent* event) {
     Page::hideEvent(event);
     timer_->stop();
+}
+
+void ScoresPage::changeEvent(QEvent* event) {
+    Page::changeEvent(event);
+    if (event->type() == QEvent::PaletteChange) followPalette();
 }
 
 // Every style.
@@ -290,7 +296,16 @@ void ScoresPage::setScore(double score) {
     const QSignalBlocker quiet(slider_);
     slider_->setValue(qRound(score * sliderSteps));
     large_->setValue(score);
+    followPalette();
     for (qt::ScoreCard* card : styles_) card->setValue(score);
+}
+
+/// The ticks cross the filled part and the empty one; the text is in the filled part from the middle on, which is light there.
+void ScoresPage::followPalette() {
+    if (!large_) return;
+    constexpr double middle = 0.5;
+    large_->setTickLineColor(palette().color(QPalette::PlaceholderText));
+    large_->setFontColor(large_->value().toDouble() < middle ? palette().color(QPalette::WindowText) : QColor(Qt::black));
 }
 
 // For pictures.

@@ -28,6 +28,7 @@ class ScoresPage final : public Page {
   protected:
     void showEvent(QShowEvent* event) override;
     void hideEvent(QHideEvent* event) override;
+    void changeEvent(QEvent* event) override;
 
   private:
     /// The parts that show one reading.
@@ -50,6 +51,7 @@ class ScoresPage final : public Page {
     void setScore(double score);
     void followThresholds();
     void fitLarge();
+    void followPalette();
 
     QTimer* timer_ = nullptr;
     QGridLayout* machine_ = nullptr;

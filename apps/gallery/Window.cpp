@@ -40,8 +40,8 @@ Window::Window(QWidget* parent) : QMainWindow(parent), list_(new QListWidget), s
     addPage(new LinksPage);
     addPage(new FilesPage);
     addPage(new BrowserPage);
-    addPage(new PanesPage);
     addPage(new ScoresPage);
+    addPage(new PanesPage);
     addPage(new ListsPage);
     choose(0);
 }
