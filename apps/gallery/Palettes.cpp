@@ -13,6 +13,7 @@ QPalette PaletteOf(Scheme scheme) {
         palette.setColor(QPalette::Base, Qt::white);
         palette.setColor(QPalette::Highlight, QColor(0x2A, 0x6F, 0xB5));
         palette.setColor(QPalette::HighlightedText, Qt::white);
+        palette.setColor(QPalette::Shadow, QColor(0x76, 0x76, 0x76));
         return palette;
     }
     const QColor window(0x2B, 0x2D, 0x30), base(0x1E, 0x1F, 0x22), text(0xE6, 0xE6, 0xE6), faint(0x8C, 0x8F, 0x94);
@@ -21,6 +22,7 @@ QPalette PaletteOf(Scheme scheme) {
     palette.setColor(QPalette::AlternateBase, window);
     palette.setColor(QPalette::Highlight, QColor(0x4A, 0x90, 0xD9));
     palette.setColor(QPalette::HighlightedText, Qt::white);
+    palette.setColor(QPalette::Shadow, QColor(0x10, 0x11, 0x12));
     palette.setColor(QPalette::Link, QColor(0x7F, 0xB4, 0xF0));
     palette.setColor(QPalette::PlaceholderText, faint);
     palette.setColor(QPalette::ToolTipBase, QColor(0x3A, 0x3D, 0x41));

@@ -27,6 +27,7 @@ class Brush {
   public:
     explicit Brush(int width) : firstRow(-(width / 2)) {
         const int half = width % 2 == 0 ? 1 : 0;
+        rows.reserve(static_cast<std::size_t>(width));
         for (int row = firstRow; row < firstRow + width; ++row) {
             // In half pixels, so that the middle of an even brush is a whole number too.
             const double away = 2.0 * row + half;
@@ -125,8 +126,11 @@ Runs BrushedBoxRuns(Point corner, Point opposite, int width, const Area& clip) {
     const auto [left, right] = std::minmax({corner.x, opposite.x});
     const auto [top, bottom] = std::minmax({corner.y, opposite.y});
     const Brush brush(width);
+    const int firstRow = std::max(top + brush.FirstRow(), clip.top);
+    const int lastRow = std::min(bottom + brush.LastRow(), clip.bottom - 1);
     Runs runs;
-    for (int row = std::max(top + brush.FirstRow(), clip.top); row <= std::min(bottom + brush.LastRow(), clip.bottom - 1); ++row) {
+    if (firstRow <= lastRow) runs.reserve(static_cast<std::size_t>(lastRow - firstRow + 1));
+    for (int row = firstRow; row <= lastRow; ++row) {
         // Of the brush's rows that come here the one nearest to its middle is the widest.
         const Run& span = brush.Row(std::clamp(0, row - bottom, row - top));
         const int first = std::max(left + span.first, clip.left), last = std::min(right + span.last, clip.right - 1);

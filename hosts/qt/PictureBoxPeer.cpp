@@ -89,7 +89,7 @@ void PictureBoxWidget::Follow() {
     if (SurfaceCanvas* canvas = Canvas()) canvas->ShowOn(this, {Border(), Border()});
     if (box_->MousePointer() != 0)
         setCursor(CursorOf(box_->MousePointer()));
-    else
+    else if (testAttribute(Qt::WA_SetCursor))
         unsetCursor();
     update();
 }

@@ -76,9 +76,10 @@ void ScoreCardWidget::read(F&& from) const {
 }
 
 QString ScoreCardWidget::gradeWord() const {
-    const QString words[] = {tr("very poor"), tr("poor"), tr("fair"), tr("good"), tr("excellent")};
+    static constexpr const char* words[] = {QT_TR_NOOP("very poor"), QT_TR_NOOP("poor"), QT_TR_NOOP("fair"), QT_TR_NOOP("good"),
+                                            QT_TR_NOOP("excellent")};
     QString word;
-    read([&](const controls::ScoreCard& card) { word = words[card.Grade() - 1]; });
+    read([&](const controls::ScoreCard& card) { word = tr(words[card.Grade() - 1]); });
     return word;
 }
 
@@ -135,7 +136,7 @@ void ScoreCardWidget::takeWholePlace() {
 }
 
 void ScoreCardWidget::tellAssistants(bool value) {
-    if (value) {
+    if (value && QAccessible::isActive()) {
         QAccessibleValueChangeEvent changed(this, get("Value"));
         QAccessible::updateAccessibility(&changed);
     }

@@ -215,10 +215,18 @@ frame::PictureRef ImageLoader::LoadPicture(const std::string& fileName) {
 
 frame::PictureRef ImageLoader::FileIcon(const std::string& path, int flags) { return icons_.Of(ToQt(path), flags); }
 
+FontMetrics::FontMetrics() {
+    QObject::connect(qApp, &QGuiApplication::fontDatabaseChanged, this, [this] { last_.reset(); });
+}
+
 frame::TextSize FontMetrics::Measure(const frame::Font& font, std::string_view text, std::optional<float> wrapWidth) {
+    Asked asked{ToQt(font), std::string(text), wrapWidth};
+    if (last_ == asked) return size_;
     const QSizeF size =
-        TextSizeOf(ToQt(font), ToQt(text), wrapWidth ? std::optional<double>(*wrapWidth / frame::twipsPerPixel) : std::nullopt);
-    return {Twips(std::ceil(size.width())), Twips(std::ceil(size.height()))};
+        TextSizeOf(asked.font, ToQt(text), wrapWidth ? std::optional<double>(*wrapWidth / frame::twipsPerPixel) : std::nullopt);
+    last_ = std::move(asked);
+    size_ = {Twips(std::ceil(size.width())), Twips(std::ceil(size.height()))};
+    return size_;
 }
 
 frame::OLE_COLOR PaletteColors::Color(int index) const {

@@ -1,11 +1,14 @@
 #pragma once
 
 #include <QElapsedTimer>
+#include <QFont>
 #include <QPointer>
 #include <QTimer>
 #include <functional>
 #include <memory>
+#include <optional>
 #include <random>
+#include <string>
 #include <unordered_map>
 #include <utility>
 #include <vector>
@@ -102,10 +105,22 @@ class ImageLoader final : public frame::PictureLoader {
     FileIcons icons_;
 };
 
-/// Measures as the widgets of this host paint.
-class FontMetrics final : public frame::TextMetrics {
+/// Measures as the widgets of this host paint. What was measured last is known: who prints a text asks for its width, its height
+/// and the place of the next line.
+class FontMetrics final : private QObject, public frame::TextMetrics {
   public:
+    FontMetrics();
     frame::TextSize Measure(const frame::Font& font, std::string_view text, std::optional<float> wrapWidth) override;
+
+  private:
+    struct Asked {
+        QFont font;
+        std::string text;
+        std::optional<float> wrapWidth;
+        friend bool operator==(const Asked&, const Asked&) = default;
+    };
+    std::optional<Asked> last_;
+    frame::TextSize size_;
 };
 
 /// The application's palette as system colours.

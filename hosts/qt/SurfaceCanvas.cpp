@@ -32,12 +32,23 @@ std::size_t BytesOf(const frame::Picture& picture) {
     return largest ? largest->pixels.size() * sizeof(std::uint32_t) : 0;
 }
 
+/// Red and blue change places. The rasters here are drawn on in such colours, and so their pixels are as a screen has them, which
+/// it copies; in the order of the raster it would convert each of them whenever it shows them.
+OLE_COLOR Turned(OLE_COLOR color) { return (color.value & 0xFF00FF00u) | (color.value & 0xFF) << 16 | (color.value >> 16 & 0xFF); }
+
 /// The pixels of a raster, to be painted on: nothing is copied.
 QImage Shared(child::Raster& raster) {
-    return {reinterpret_cast<uchar*>(raster.Pixels().data()), raster.Width(), raster.Height(), QImage::Format_RGBX8888};
+    return {reinterpret_cast<uchar*>(raster.Pixels().data()), raster.Width(), raster.Height(), QImage::Format_RGB32};
 }
 QImage Shared(const child::Raster& raster) {
-    return {reinterpret_cast<const uchar*>(raster.Pixels().data()), raster.Width(), raster.Height(), QImage::Format_RGBX8888};
+    return {reinterpret_cast<const uchar*>(raster.Pixels().data()), raster.Width(), raster.Height(), QImage::Format_RGB32};
+}
+
+frame::PixelPlane PlaneAt(double scale, const child::Raster& raster) {
+    frame::PixelPlane plane{scale, raster.Width(), raster.Height(), {}};
+    plane.pixels.reserve(raster.Pixels().size());
+    for (const std::uint32_t pixel : raster.Pixels()) plane.pixels.push_back(Turned(pixel).value);
+    return plane;
 }
 
 /// How a stroke is drawn in the pixels of a screen, so that each of its pixels at scale 1 becomes the square of pixels that
@@ -162,14 +173,14 @@ void SurfaceCanvas::Keep(Step step, std::size_t bytes) {
     cut_ = true;
 }
 
-std::optional<OLE_COLOR> SurfaceCanvas::Pixel(int x, int y) const { return PlaneOf(1).raster.Pixel(x, y); }
+std::optional<OLE_COLOR> SurfaceCanvas::Pixel(int x, int y) const {
+    const std::optional<OLE_COLOR> pixel = PlaneOf(1).raster.Pixel(x, y);
+    return pixel ? Turned(*pixel) : pixel;
+}
 
 std::vector<frame::PixelPlane> SurfaceCanvas::Planes() const {
-    std::vector<frame::PixelPlane> planes = PlaneOf(1).raster.Planes();
-    if (const double scale = ScreenScale(); scale != 1) {
-        planes.push_back(PlaneOf(scale).raster.Planes().front());
-        planes.back().scale = scale;
-    }
+    std::vector<frame::PixelPlane> planes = {PlaneAt(1, PlaneOf(1).raster)};
+    if (const double scale = ScreenScale(); scale != 1) planes.push_back(PlaneAt(scale, PlaneOf(scale).raster));
     return planes;
 }
 
@@ -216,7 +227,7 @@ SurfaceCanvas::Plane& SurfaceCanvas::PlaneOf(double scale) const {
 }
 
 void SurfaceCanvas::Begin(Plane& plane) const {
-    const OLE_COLOR background = Rgb(surface_.BackColor());
+    const OLE_COLOR background = Turned(Rgb(surface_.BackColor()));
     plane.raster.Resize(Scaled(sizeAtFirst_.width, plane.scale), Scaled(sizeAtFirst_.height, plane.scale), background);
     plane.raster.Wipe(background, nullptr);
     if (behind_) Paint(plane, *behind_, {});
@@ -225,7 +236,8 @@ void SurfaceCanvas::Begin(Plane& plane) const {
 }
 
 void SurfaceCanvas::BeginFrom(Plane& plane, const Plane& other) const {
-    plane.raster = child::Raster(Scaled(size_.width, plane.scale), Scaled(size_.height, plane.scale), Rgb(surface_.BackColor()));
+    plane.raster =
+        child::Raster(Scaled(size_.width, plane.scale), Scaled(size_.height, plane.scale), Turned(Rgb(surface_.BackColor())));
     plane.done = steps_.size();
     plane.begun = true;
     if (size_.width <= 0 || size_.height <= 0) return;
@@ -243,7 +255,7 @@ void SurfaceCanvas::CatchUp(Plane& plane) const {
 void SurfaceCanvas::Do(Plane& plane, const Stroke& stroke) const {
     const Grid grid(stroke.pen, stroke.scale, plane.scale);
     const auto raster = [&](auto op) {
-        op.color = Rgb(op.color);
+        op.color = Turned(Rgb(op.color));
         plane.raster.Draw(op, grid.pen, {}, {}, {});
     };
     if (const auto* line = std::get_if<draw::Line>(&stroke.op))
@@ -260,7 +272,7 @@ void SurfaceCanvas::Do(Plane& plane, const Stroke& stroke) const {
 
 void SurfaceCanvas::Do(Plane& plane, const Size& size) const {
     const int width = Scaled(size.width, plane.scale), height = Scaled(size.height, plane.scale);
-    const child::Raster before = std::exchange(plane.raster, child::Raster(width, height, Rgb(surface_.BackColor())));
+    const child::Raster before = std::exchange(plane.raster, child::Raster(width, height, Turned(Rgb(surface_.BackColor()))));
     if (behind_) Paint(plane, *behind_, {});
     plane.raster.Blit(0, 0, before, {0, 0, before.Width(), before.Height()});
 }
@@ -327,7 +339,7 @@ void SurfaceCanvas::Damage(const QRectF& bounds) {
 }
 
 void SurfaceCanvas::DamageAll() {
-    damaged_ = {};
+    damaged_ = QRect(corner_, QSize(size_.width, size_.height));
     if (shown_) shown_->update();
 }
 

@@ -35,7 +35,7 @@ void WidgetPeer::FollowChild() {
     widget_->setGeometry(PixelRect(child_.Left(), child_.Top(), child_.Width(), child_.Height()));
     widget_->setVisible(child_.Visible());
     widget_->setEnabled(child_.Enabled());
-    widget_->setToolTip(ToQt(child_.ToolTipText()));
+    if (const QString tip = ToQt(child_.ToolTipText()); widget_->toolTip() != tip) widget_->setToolTip(tip);
 }
 
 std::unique_ptr<frame::Peer> MakePeer(frame::ChildControl& child) {
