@@ -10,6 +10,7 @@
 
 #include "bench/Contest.h"
 #include "bench/LiveBytes.h"
+#include "bench/qt/Run.h"
 #include "frame/Text.h"
 #include "hosts/qt/DataList.h"
 
@@ -22,11 +23,6 @@ namespace {
 /// A program with a database of 100,000 rows.
 struct Program {
     Program() {
-        qputenv("QT_QPA_PLATFORM", "offscreen");
-        static int count = 1;
-        static char name[] = "QtDataList_bench";
-        static char* arguments[] = {name, nullptr};
-        application = std::make_unique<QApplication>(count, arguments);
         database = QSqlDatabase::addDatabase("QSQLITE");
         database.setDatabaseName(":memory:");
         database.open();
@@ -35,7 +31,6 @@ struct Program {
             "CREATE TABLE items AS WITH RECURSIVE n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n WHERE i < 100000) "
             "SELECT i AS id, 'Holiday picture ' || (i * 7919 % 1000003) AS name FROM n");
     }
-    std::unique_ptr<QApplication> application;
     QSqlDatabase database;
 };
 
@@ -175,3 +170,5 @@ BENCHMARK(ShowAndOpen)->Arg(100'000)->UseManualTime()->Iterations(5)->Unit(bench
 
 }  // namespace
 }  // namespace tessel::qt
+
+int main(int count, char** arguments) { return tessel::bench::Run(count, arguments); }

@@ -7,6 +7,7 @@
 #include <memory>
 
 #include "bench/Contest.h"
+#include "bench/qt/Run.h"
 #include "frame/ClassTable.h"
 #include "frame/child/PictureBox.h"
 #include "hosts/qt/ControlWidget.h"
@@ -195,11 +196,4 @@ BENCHMARK(ShownToo)->Iterations(25)->UseManualTime()->Unit(benchmark::kMilliseco
 }  // namespace
 }  // namespace tessel::qt
 
-int main(int count, char** arguments) {
-    if (!qEnvironmentVariableIsSet("QT_QPA_PLATFORM")) qputenv("QT_QPA_PLATFORM", "offscreen");
-    QApplication program(count, arguments);
-    QApplication::setStyle("Fusion");
-    benchmark::Initialize(&count, arguments);
-    benchmark::RunSpecifiedBenchmarks();
-    return 0;
-}
+int main(int count, char** arguments) { return tessel::bench::Run(count, arguments); }

@@ -17,6 +17,7 @@
 #include "bench/Contest.h"
 #include "bench/FilePeers.h"
 #include "bench/FileTrees.h"
+#include "bench/qt/Run.h"
 #include "hosts/posix/DiskFileSystem.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/FileView.h"
@@ -419,13 +420,4 @@ BENCHMARK(SearchOnScreen)->Iterations(1)->UseManualTime()->Unit(benchmark::kMill
 }  // namespace
 }  // namespace tessel::qt
 
-int main(int count, char** arguments) {
-    mallopt(M_ARENA_MAX, 1);  // what other threads hold is counted too
-    if (qEnvironmentVariableIsEmpty("DISPLAY") && !qEnvironmentVariableIsSet("QT_QPA_PLATFORM"))
-        qputenv("QT_QPA_PLATFORM", "offscreen");
-    tessel::qt::Program program(count, arguments);
-    QApplication::setStyle("Fusion");
-    benchmark::Initialize(&count, arguments);
-    benchmark::RunSpecifiedBenchmarks();
-    return 0;
-}
+int main(int count, char** arguments) { return tessel::bench::Run<tessel::qt::Program>(count, arguments); }

@@ -15,6 +15,7 @@
 #include "bench/Contest.h"
 #include "bench/FilePeers.h"
 #include "bench/FileTrees.h"
+#include "bench/qt/Run.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/FolderView.h"
 #include "hosts/qt/Host.h"
@@ -172,13 +173,4 @@ BENCHMARK(FindByPath)->Iterations(3)->UseManualTime()->Unit(benchmark::kMillisec
 }  // namespace
 }  // namespace tessel::qt
 
-int main(int count, char** arguments) {
-    mallopt(M_ARENA_MAX, 1);  // what other threads hold is counted too
-    if (qEnvironmentVariableIsEmpty("DISPLAY") && !qEnvironmentVariableIsSet("QT_QPA_PLATFORM"))
-        qputenv("QT_QPA_PLATFORM", "offscreen");
-    QApplication program(count, arguments);
-    QApplication::setStyle("Fusion");
-    benchmark::Initialize(&count, arguments);
-    benchmark::RunSpecifiedBenchmarks();
-    return 0;
-}
+int main(int count, char** arguments) { return tessel::bench::Run(count, arguments); }

@@ -15,6 +15,7 @@
 #include <string>
 #include <vector>
 
+#include "bench/qt/Run.h"
 #include "frame/Text.h"
 #include "hosts/headless/HeadlessHost.h"
 #include "hosts/qt/ControlWidget.h"
@@ -240,11 +241,4 @@ BENCHMARK(ItemByItem)->Arg(100'000)->Arg(1'000'000)->Iterations(5)->UseManualTim
 }  // namespace
 }  // namespace tessel::qt
 
-int main(int count, char** arguments) {
-    if (!qEnvironmentVariableIsSet("QT_QPA_PLATFORM")) qputenv("QT_QPA_PLATFORM", "offscreen");
-    QApplication program(count, arguments);
-    QApplication::setStyle("Fusion");
-    benchmark::Initialize(&count, arguments);
-    benchmark::RunSpecifiedBenchmarks();
-    return 0;
-}
+int main(int count, char** arguments) { return tessel::bench::Run(count, arguments); }

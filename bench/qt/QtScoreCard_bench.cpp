@@ -7,6 +7,7 @@
 #include <functional>
 
 #include "bench/Contest.h"
+#include "bench/qt/Run.h"
 #include "hosts/qt/ScoreCard.h"
 
 /// A gauge in a window: a new score to painted pixels, beside the same lines, boxes and text straight on a painter, and beside the
@@ -117,12 +118,4 @@ BENCHMARK(RedrawGauge)->Iterations(15)->UseManualTime()->Unit(benchmark::kMillis
 }  // namespace
 }  // namespace tessel::qt
 
-int main(int count, char** arguments) {
-    if (qEnvironmentVariableIsEmpty("DISPLAY") && !qEnvironmentVariableIsSet("QT_QPA_PLATFORM"))
-        qputenv("QT_QPA_PLATFORM", "offscreen");
-    QApplication program(count, arguments);
-    QApplication::setStyle("Fusion");
-    benchmark::Initialize(&count, arguments);
-    benchmark::RunSpecifiedBenchmarks();
-    return 0;
-}
+int main(int count, char** arguments) { return tessel::bench::Run(count, arguments); }

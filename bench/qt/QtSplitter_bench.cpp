@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "bench/Contest.h"
+#include "bench/qt/Run.h"
 #include "frame/Text.h"
 #include "hosts/qt/Convert.h"
 #include "hosts/qt/Form.h"
@@ -119,11 +120,4 @@ BENCHMARK(Find);
 }  // namespace
 }  // namespace tessel::qt
 
-int main(int count, char** arguments) {
-    if (!qEnvironmentVariableIsSet("QT_QPA_PLATFORM")) qputenv("QT_QPA_PLATFORM", "offscreen");
-    QApplication program(count, arguments);
-    QApplication::setStyle("Fusion");
-    benchmark::Initialize(&count, arguments);
-    benchmark::RunSpecifiedBenchmarks();
-    return 0;
-}
+int main(int count, char** arguments) { return tessel::bench::Run(count, arguments); }

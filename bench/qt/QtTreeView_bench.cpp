@@ -10,6 +10,7 @@
 #include <memory>
 #include <string>
 
+#include "bench/qt/Run.h"
 #include "frame/Text.h"
 #include "hosts/headless/HeadlessHost.h"
 #include "hosts/qt/ControlWidget.h"
@@ -184,11 +185,4 @@ BENCHMARK(ItemByItem)->Arg(50'000)->Arg(500'000)->Iterations(5)->UseManualTime()
 }  // namespace
 }  // namespace tessel::qt
 
-int main(int count, char** arguments) {
-    if (!qEnvironmentVariableIsSet("QT_QPA_PLATFORM")) qputenv("QT_QPA_PLATFORM", "offscreen");
-    QApplication program(count, arguments);
-    QApplication::setStyle("Fusion");
-    benchmark::Initialize(&count, arguments);
-    benchmark::RunSpecifiedBenchmarks();
-    return 0;
-}
+int main(int count, char** arguments) { return tessel::bench::Run(count, arguments); }

@@ -83,36 +83,9 @@ class ReportingHost {
     frame::Control* control_ = nullptr;
 };
 
-/// For each property a value that the cards of these tests do not have, in an order in which none is clamped.
-MemoryBag::Contents OtherValues() {
-    return {{"BackColor", OLE_COLOR(1)},
-            {"ForeColor", OLE_COLOR(2)},
-            {"Enabled", false},
-            {"Font", std::make_shared<frame::Font>("Courier", 20)},
-            {"BorderStyle", 0},
-            {"Value", 0.25},
-            {"Style", style::smileyLarge},
-            {"ScoreMin", -1},
-            {"ScoreMax", 2},
-            {"ScoreStar", 1.5},
-            {"ScoreGood", 0.5},
-            {"ScoreMaybe", 0.25},
-            {"ScoreBad", -0.5},
-            {"ShowLimitLines", true},
-            {"ShowTickLinesEvery", 0.25},
-            {"TickLineColor", OLE_COLOR(3)},
-            {"FontColor", OLE_COLOR(4)},
-            {"ShowValue", 6},
-            {"ToolTipStyle", 1},
-            {"ToolTip", "A score"},
-            {"ShowMarker", 2},
-            {"ShowBlocks", 10},
-            {"GaugeOrientation", 1}};
-}
-
 TEST(ScoreCardReports, AHostMayDestroyTheCardInEachReport) {
     for (const int style : {style::scoreCardSmall, style::flashCard, style::gauge}) {
-        for (const auto& [key, value] : OtherValues()) {
+        for (const auto& [key, value] : OtherValues(style::smileyLarge)) {
             ReportingHost host({{"Style", style}});
             host.onReport = [&](std::string_view) { host.Destroy(); };
             host.Put(key, value);
@@ -124,10 +97,10 @@ TEST(ScoreCardReports, AHostMayDestroyTheCardInEachReport) {
 
 TEST(ScoreCardReports, AHostMaySetEveryPropertyInEachReport) {
     for (const int style : {style::scoreCardSmall, style::flashCard, style::gauge}) {
-        for (const auto& [key, value] : OtherValues()) {
+        for (const auto& [key, value] : OtherValues(style::smileyLarge)) {
             ReportingHost host({{"Style", style}});
             host.onReport = [&](std::string_view) {
-                for (const auto& [other, otherValue] : OtherValues()) host.Control().Put(other, otherValue);
+                for (const auto& [other, otherValue] : OtherValues(style::smileyLarge)) host.Control().Put(other, otherValue);
             };
             host.Put(key, value);
             EXPECT_EQ(host.Control().Get("Value"), Variant(0.25)) << key;

@@ -38,6 +38,33 @@ inline constexpr int scoreCardSmall = 0, scoreCardLarge = 1, smileySmall = 2, sm
 inline constexpr std::uint32_t black = 0, white = 0xFFFFFF, red = 0x0000FF, yellow = 0x00FFFF, green = 0x00FF00, cyan = 0xFFFF00,
                                buttonFace = 0x8000000F, buttonText = 0x80000012;
 
+/// For each property a value that a new card does not have, in an order in which none is clamped.
+inline frame::MemoryBag::Contents OtherValues(int style) {
+    return {{"BackColor", frame::OLE_COLOR(1)},
+            {"ForeColor", frame::OLE_COLOR(2)},
+            {"Enabled", false},
+            {"Font", std::make_shared<frame::Font>("Courier", 20)},
+            {"BorderStyle", 0},
+            {"Value", 0.25},
+            {"Style", style},
+            {"ScoreMin", -1},
+            {"ScoreMax", 2},
+            {"ScoreStar", 1.5},
+            {"ScoreGood", 0.5},
+            {"ScoreMaybe", 0.25},
+            {"ScoreBad", -0.5},
+            {"ShowLimitLines", true},
+            {"ShowTickLinesEvery", 0.25},
+            {"TickLineColor", frame::OLE_COLOR(3)},
+            {"FontColor", frame::OLE_COLOR(4)},
+            {"ShowValue", 6},
+            {"ToolTipStyle", 1},
+            {"ToolTip", "A score"},
+            {"ShowMarker", 2},
+            {"ShowBlocks", 10},
+            {"GaugeOrientation", 1}};
+}
+
 /// A border of two pixels on each side and an inner size in pixels, as a size in twips.
 constexpr float Outer(float innerPixels) { return (innerPixels + 4) * 15; }
 /// The inner size of the cards, in pixels; a vertical one has the two exchanged.
