@@ -17,11 +17,31 @@ if(TESSEL_SANITIZE)
         -fsanitize=address,undefined -fno-sanitize-recover=all -fno-omit-frame-pointer)
     target_link_options(tessel_build_flags INTERFACE -fsanitize=address,undefined)
 endif()
+
+# Tests are compiled without optimisation, which takes the compiler a third of the time; what they test is not.
+add_library(tessel_test_flags INTERFACE)
+target_compile_options(tessel_test_flags INTERFACE -O0)
+
+# What the fuzzing programs reach tells them which way it went.
+add_library(tessel_fuzzed_flags INTERFACE)
 if(TESSEL_FUZZ)
-    target_compile_options(tessel_build_flags INTERFACE
-        -fsanitize=fuzzer-no-link,address,undefined -fno-sanitize-recover=all -fno-omit-frame-pointer)
-    target_link_options(tessel_build_flags INTERFACE -fsanitize=address,undefined)
+    target_compile_options(tessel_fuzzed_flags INTERFACE -fsanitize=fuzzer-no-link)
 endif()
+
+# tessel_precompiled_headers(tessel_test_headers HEADERS <string> "frame/Control.h" DEPENDS tessel_frame)
+# Headers that are compiled once for all targets with the same flags, which take them by tessel_precompiled.
+function(tessel_precompiled_headers name)
+    cmake_parse_arguments(ARG "" "" "HEADERS;DEPENDS" ${ARGN})
+    file(CONFIGURE OUTPUT ${CMAKE_CURRENT_BINARY_DIR}/${name}.cpp CONTENT "")
+    add_library(${name} OBJECT ${CMAKE_CURRENT_BINARY_DIR}/${name}.cpp)
+    target_link_libraries(${name} PRIVATE ${ARG_DEPENDS} tessel_build_flags)
+    set_target_properties(${name} PROPERTIES AUTOMOC OFF)
+    target_precompile_headers(${name} PRIVATE ${ARG_HEADERS})
+endfunction()
+
+function(tessel_precompiled target headers)
+    target_precompile_headers(${target} REUSE_FROM ${headers})
+endfunction()
 
 # tessel_library(frame SOURCES a.cpp b.cpp DEPENDS tessel_frame)
 # A static library tessel_<name> of the folder it stands in, with the folder's headers and the project's root on the include
@@ -38,7 +58,7 @@ function(tessel_library name)
         target_sources(tessel_${name} PUBLIC FILE_SET made_headers TYPE HEADERS BASE_DIRS ${root} FILES ${ARG_HEADERS_OF})
     endif()
     target_compile_features(tessel_${name} PUBLIC cxx_std_20)
-    target_link_libraries(tessel_${name} PUBLIC ${ARG_DEPENDS} PRIVATE $<BUILD_INTERFACE:tessel_build_flags>)
+    target_link_libraries(tessel_${name} PUBLIC ${ARG_DEPENDS} PRIVATE $<BUILD_INTERFACE:tessel_build_flags> $<BUILD_INTERFACE:tessel_fuzzed_flags>)
     set_target_properties(tessel_${name} PROPERTIES EXPORT_NAME internal::${name})
     if(ARG_INSTALL_AS)
         set_target_properties(tessel_${name} PROPERTIES EXPORT_NAME ${ARG_INSTALL_AS})
@@ -100,7 +120,8 @@ endfunction()
 # One test program of a folder, run by ctest as one test.
 function(tessel_test name)
     cmake_parse_arguments(ARG "" "" "SOURCES;DEPENDS" ${ARGN})
-    tessel_program(${name} SOURCES ${ARG_SOURCES} DEPENDS ${ARG_DEPENDS} GTest::gmock GTest::gtest_main)
+    tessel_program(${name} SOURCES ${ARG_SOURCES} DEPENDS ${ARG_DEPENDS} tessel_test_flags GTest::gmock GTest::gtest_main)
+    tessel_precompiled(${name} tessel_test_headers)
     add_test(NAME ${name} COMMAND ${name})
 endfunction()
 
@@ -110,6 +131,27 @@ function(tessel_folder_tests name)
     file(GLOB sources CONFIGURE_DEPENDS *_test.cpp)
     if(sources)
         tessel_test(${name} SOURCES ${sources} ${ARGN})
+    endif()
+endfunction()
+
+# tessel_control_tests(link DEPENDS tessel_controls_link)
+# All files *_test.cpp of the folder, compiled once and linked twice: link_tests on the headless host, link_on_qt_tests on the host
+# for Qt. Files *OnHeadless_test.cpp are for the first alone.
+function(tessel_control_tests name)
+    cmake_parse_arguments(ARG "" "" "DEPENDS" ${ARGN})
+    file(GLOB sources CONFIGURE_DEPENDS *_test.cpp)
+    set(headless ${sources})
+    list(FILTER headless INCLUDE REGEX "OnHeadless_test\\.cpp$")
+    list(FILTER sources EXCLUDE REGEX "OnHeadless_test\\.cpp$")
+    add_library(${name}_test_objects OBJECT ${sources})
+    target_link_libraries(${name}_test_objects PRIVATE
+        ${ARG_DEPENDS} tessel_headless tessel_build_flags tessel_test_flags GTest::gmock)
+    tessel_precompiled(${name}_test_objects tessel_test_headers)
+    tessel_test(${name}_tests SOURCES $<TARGET_OBJECTS:${name}_test_objects> ${headless}
+        DEPENDS headless_test_host ${ARG_DEPENDS} tessel_headless)
+    if(TESSEL_QT)
+        tessel_qt_test(${name}_on_qt_tests SOURCES $<TARGET_OBJECTS:${name}_test_objects>
+            DEPENDS qt_test_host ${ARG_DEPENDS})
     endif()
 endfunction()
 
@@ -142,24 +184,12 @@ function(tessel_fuzzer name)
         -seed=1 -runs=100000 -max_total_time=30 -timeout=10 -verbosity=0 -print_final_stats=1 ${corpus} ${seeds})
 endfunction()
 
-# tessel_tests_on_qt(link_on_qt_tests DEPENDS tessel_controls_link)
-# The tests of the folder once more, on the host for Qt.
-function(tessel_tests_on_qt name)
-    if(NOT TESSEL_QT)
-        return()
-    endif()
-    cmake_parse_arguments(ARG "" "" "DEPENDS" ${ARGN})
-    file(GLOB sources CONFIGURE_DEPENDS *_test.cpp)
-    tessel_qt_test(${name} SOURCES ${sources} DEPENDS ${ARG_DEPENDS} tessel_headless)
-    target_compile_definitions(${name} PRIVATE TESSEL_TESTED_ON_QT)
-endfunction()
-
 # tessel_qt_test(qt_tests SOURCES a_test.cpp DEPENDS tessel_headless)
 # A test program with widgets. They are shown on no screen, and nothing of the user's is read or written.
 function(tessel_qt_test name)
     cmake_parse_arguments(ARG "" "" "SOURCES;DEPENDS" ${ARGN})
-    tessel_program(${name} SOURCES ${ARG_SOURCES} ${PROJECT_SOURCE_DIR}/tests/hosts/qt/main.cpp
-        DEPENDS ${ARG_DEPENDS} tessel_qt GTest::gmock)
+    tessel_program(${name} SOURCES ${ARG_SOURCES} DEPENDS qt_test_main ${ARG_DEPENDS} tessel_qt_test_flags)
+    tessel_precompiled(${name} tessel_qt_test_headers)
     add_test(NAME ${name} COMMAND ${name})
     set(home ${CMAKE_CURRENT_BINARY_DIR}/${name}_home)
     file(MAKE_DIRECTORY ${home})

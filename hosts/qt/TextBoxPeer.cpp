@@ -186,27 +186,28 @@ void TextBoxWidget::Edited() {
 
 bool TextBoxWidget::eventFilter(QObject* watched, QEvent* event) {
     if (!box_) return QFrame::eventFilter(watched, event);
-    const auto inside = [&](const QMouseEvent& mouse) {
+    // The mouse's event in the box's own pixels.
+    const auto inside = [&] {
+        const auto& mouse = static_cast<const QMouseEvent&>(*event);
         const QPointF moved = pressed_->mapTo(this, mouse.position());
         return QMouseEvent(mouse.type(), moved, mouse.scenePosition(), mouse.globalPosition(), mouse.button(), mouse.buttons(),
                            mouse.modifiers());
     };
-    const auto& mouse = static_cast<const QMouseEvent&>(*event);
     switch (event->type()) {
         case QEvent::KeyPress:
             if (watched != pressed_ || line_) keys_->Press(static_cast<const QKeyEvent&>(*event));
             break;
         case QEvent::MouseButtonPress:
-            if (watched == pressed_) pointer_.Press(inside(mouse));
+            if (watched == pressed_) pointer_.Press(inside());
             break;
         case QEvent::MouseMove:
-            if (watched == pressed_) pointer_.Move(inside(mouse));
+            if (watched == pressed_) pointer_.Move(inside());
             break;
         case QEvent::MouseButtonRelease:
-            if (watched == pressed_) pointer_.Release(inside(mouse));
+            if (watched == pressed_) pointer_.Release(inside());
             break;
         case QEvent::MouseButtonDblClick:
-            if (watched == pressed_) pointer_.DoubleClick(inside(mouse));
+            if (watched == pressed_) pointer_.DoubleClick(inside());
             break;
         case QEvent::Leave:
             if (watched == pressed_) pointer_.Leave();

@@ -168,7 +168,7 @@ TEST_P(DataListHandlers, AHandlerMayDestroyTheControl) {
     Send();
     EXPECT_FALSE(stage.Lives());
     EXPECT_TRUE(stage.host.errors.reports.empty());
-    EXPECT_EQ(stage.host.Form().Count(), 0);
+    EXPECT_EQ(stage.host.OnForm().Count(), 0);
 }
 
 TEST_P(DataListHandlers, ADestroyedControlRaisesNothingMore) {

@@ -14,11 +14,6 @@ namespace {
 using test::ErrorOf;
 using namespace datalisttest;
 
-std::string ToolTips(Stage& stage) {
-    return stage.List(0).Get("ToolTipText").ToText() + " | " + stage.List(1).Get("ToolTipText").ToText() + " | " +
-           stage.Label().Get("ToolTipText").ToText();
-}
-
 // Beginning.
 
 TEST(DataListLife, ItBeginsEmptyWithTheFirstListToBeSeen) {
@@ -106,13 +101,6 @@ TEST(DataListSize, AllThreeChildrenAreAsWideAsTheControl) {
             EXPECT_EQ(child->Get("Width"), Variant(tried)) << child->Path();
     }
 }
-
-#ifndef TESSEL_TESTED_ON_QT
-TEST(DataListSize, WithoutAScreenItIs315TwipsHigh) {
-    Stage stage;
-    EXPECT_EQ(stage.TheSite().Height(), 315);
-}
-#endif
 
 // In a form designer.
 
@@ -261,34 +249,6 @@ TEST(DataListToolTip, ACopiedOneIsSaved) {
     Stage stage(Stage::Options{.toolTip = "Choose one"});
     EXPECT_EQ(stage.Saved("ToolTipText"), Variant("Choose one"));
 }
-
-#ifndef TESSEL_TESTED_ON_QT
-// What a host may be and the one for Qt is not: without tool tips, or with one that reaches the children only at the next Show.
-
-TEST(DataListToolTip, EachShowCopiesItAfresh) {
-    Stage stage(Stage::Options{.toolTip = "First", .show = false});
-    EXPECT_EQ(ToolTips(stage), " |  | ");
-    auto& site = *stage.host.SiteOf(stage.Control());
-    site.SetVisible(true);
-    EXPECT_EQ(ToolTips(stage), "First | First | First");
-    site.Extender().Put("ToolTipText", "Second");
-    EXPECT_EQ(ToolTips(stage), "First | First | First");
-    site.SetVisible(false);
-    site.SetVisible(true);
-    EXPECT_EQ(ToolTips(stage), "Second | Second | Second");
-}
-
-TEST(DataListToolTip, AHostWithoutToolTipsLeavesTheChildrensOwnWithoutAnError) {
-    Stage stage;
-    stage.List(0).Put("ToolTipText", "First");
-    stage.List(1).Put("ToolTipText", "Second");
-    stage.Label().Put("ToolTipText", "Third");
-    EXPECT_EQ(ErrorOf([&] { Call(stage.Control(), "Refresh"); }), 0);
-    EXPECT_EQ(ErrorOf([&] { stage.TheSite().Show(); }), 0);
-    EXPECT_EQ(ToolTips(stage), "First | Second | Third");
-    EXPECT_TRUE(stage.host.errors.reports.empty());
-}
-#endif
 
 }  // namespace
 }  // namespace tessel::controls

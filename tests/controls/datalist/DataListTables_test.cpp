@@ -463,7 +463,7 @@ TEST(DataListTables, AValueThatDoesNotConvertFailsTheLoadAndLeavesNoControlBehin
                             "Sorted", "ListCount", "OnlyUniqueValues"}) {
         EXPECT_EQ(LoadError(host, key, "wide"), frame::errors::typeMismatch) << key;
         EXPECT_EQ(host.FindSite("List2"), nullptr) << key;
-        EXPECT_EQ(host.Form().Count(), 0) << key;
+        EXPECT_EQ(host.OnForm().Count(), 0) << key;
     }
 }
 

@@ -315,4 +315,9 @@ struct Loaded {
     Stage stage{Stage::Options{.saved = &bag}};
 };
 
+inline std::string ToolTips(Stage& stage) {
+    return stage.List(0).Get("ToolTipText").ToText() + " | " + stage.List(1).Get("ToolTipText").ToText() + " | " +
+           stage.Label().Get("ToolTipText").ToText();
+}
+
 }  // namespace tessel::controls::datalisttest

@@ -110,7 +110,7 @@ TEST_P(LinkHandlers, HandlerThatDestroysTheLinkLetsItFinishItsReaction) {
     On([&] { host.Destroy(link()); });
     Send();
     EXPECT_EQ(host.FindSite("Link1"), nullptr);
-    EXPECT_EQ(host.Form().Count(), 0);
+    EXPECT_EQ(host.OnForm().Count(), 0);
     EXPECT_EQ(Requests(host), Reaction());
     EXPECT_EQ(host.log.EventNames(), GetParam().name);
     EXPECT_THAT(host.errors.reports, IsEmpty());
@@ -284,7 +284,7 @@ TEST_P(LinkHandlers, AnotherLinkOfTheSameNameIsUntouchedByTheReactionOfTheFirst)
     Send();
     ASSERT_NE(second, nullptr);
     EXPECT_EQ(host.FindSite("Link1"), host.SiteOf(*second));
-    EXPECT_EQ(host.Form().Count(), 1);
+    EXPECT_EQ(host.OnForm().Count(), 1);
     EXPECT_EQ(Requests(host), Reaction());
     EXPECT_EQ(Shown(*second), "unused");
     EXPECT_FALSE(IsUsed(*second));
@@ -345,7 +345,7 @@ TEST_P(LinkHandlers, HandlerOfOneLinkMayDestroyAllOthers) {
         for (int i = 2; i < 10; ++i) host.Destroy(host.FindSite("Link" + std::to_string(i))->Control());
     });
     Send();
-    EXPECT_EQ(host.Form().Count(), 1);
+    EXPECT_EQ(host.OnForm().Count(), 1);
     EXPECT_EQ(Requests(host), Reaction());
 }
 

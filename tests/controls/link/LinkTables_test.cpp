@@ -390,7 +390,7 @@ TEST(LinkTables, AValueThatDoesNotConvertFailsTheLoadAndLeavesNoControlBehind) {
                             "HighlightColor", "UsedColor", "Forecolor", "BorderSize", "SuppressMessages", "ClickAction"}) {
         EXPECT_EQ(LoadError(host, key, "wide"), frame::errors::typeMismatch) << key;
         EXPECT_EQ(host.FindSite("Link1"), nullptr) << key;
-        EXPECT_EQ(host.Form().Count(), 0) << key;
+        EXPECT_EQ(host.OnForm().Count(), 0) << key;
     }
     EXPECT_THAT(Changes(host), IsEmpty());
 }
@@ -415,7 +415,7 @@ TEST(LinkTables, AFontThatIsNoFontFailsTheLoad) {
     HostUnderTest host;
     EXPECT_NE(LoadError(host, "Font", "Courier"), 0);
     EXPECT_EQ(LoadError(host, "Font", frame::ObjectRef(host.Form())), frame::errors::typeMismatch);
-    EXPECT_EQ(host.Form().Count(), 0);
+    EXPECT_EQ(host.OnForm().Count(), 0);
 }
 
 TEST(LinkTables, AFailedLoadDoesNotHinderTheNextOfTheSameName) {

@@ -119,7 +119,7 @@ TEST_P(ScoreCardEvents, HandlerThatDestroysTheCardIsItsLast) {
     On([&] { card.host.Destroy(card.control); });
     Send();
     EXPECT_EQ(card.host.FindSite("ScoreCard1"), nullptr);
-    EXPECT_EQ(card.host.Form().Count(), 0);
+    EXPECT_EQ(card.host.OnForm().Count(), 0);
     EXPECT_EQ(card.host.log.EventNames(), GetParam().name);
     EXPECT_THAT(card.host.errors.reports, IsEmpty());
 }

@@ -534,7 +534,7 @@ TEST(ScoreCardTables, AValueThatDoesNotConvertFailsTheLoadAndLeavesNoControlBehi
           "ShowLimitLines", "TickLineColor", "FontColor", "ToolTipStyle", "ShowBlocks"}) {
         EXPECT_EQ(LoadError(host, {{key, "wide"}}), frame::errors::typeMismatch) << key;
         EXPECT_EQ(host.FindSite("ScoreCard1"), nullptr) << key;
-        EXPECT_EQ(host.Form().Count(), 0) << key;
+        EXPECT_EQ(host.OnForm().Count(), 0) << key;
     }
 }
 

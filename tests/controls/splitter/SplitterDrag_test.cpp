@@ -467,7 +467,7 @@ TEST(SplitterOnItsHost, ABarStaysWithinItsForm) {
     site.SetPlace(0, 1000);
     site.SetSize(3000, thick);
     DragBy(bar, 0, 1e6f);
-    EXPECT_EQ(site.Top(), host.Form().ScaleHeight() - thick);
+    EXPECT_EQ(site.Top(), Inner(host, "ScaleHeight") - thick);
     DragBy(bar, 0, -1e6f);
     EXPECT_EQ(site.Top(), 0);
 }
@@ -481,7 +481,7 @@ TEST(SplitterOnItsHost, ALoadedBarKeepsItsLimits) {
     DragBy(bar, 0, -1e6f);
     EXPECT_EQ(site.Top(), 600);
     DragBy(bar, 0, 1e6f);
-    EXPECT_EQ(site.Top(), host.Form().ScaleHeight() - 800 - thick);
+    EXPECT_EQ(site.Top(), Inner(host, "ScaleHeight") - 800 - thick);
 }
 
 }  // namespace

@@ -37,7 +37,7 @@ const Casting newAtDesignTime = {.designTime = true};
 TEST(SplitterPlacement, ANewBarLiesAcrossTheMiddleOfItsFormAtDesignTime) {
     HostUnderTest host;
     auto& bar = host.Create(SplitterClass(), "Splitter1", {.designTime = true, .width = 500, .height = 500});
-    EXPECT_EQ(PlaceOf(*host.SiteOf(bar)), PlaceText(0, host.Form().ScaleHeight() / 2, host.Form().ScaleWidth(), thick));
+    EXPECT_EQ(PlaceOf(*host.SiteOf(bar)), PlaceText(0, Inner(host, "ScaleHeight") / 2, Inner(host, "ScaleWidth"), thick));
     EXPECT_EQ(bar.Get("MousePointer"), Variant(7));
     EXPECT_EQ(bar.Get("Orientation"), Variant(horizontal));
 }
@@ -46,7 +46,7 @@ TEST(SplitterPlacement, ABarTurnedUprightStandsInTheMiddleOfItsForm) {
     HostUnderTest host;
     auto& bar = host.Create(SplitterClass(), "Splitter1", {.designTime = true});
     bar.Put("Orientation", vertical);
-    EXPECT_EQ(PlaceOf(*host.SiteOf(bar)), PlaceText(host.Form().ScaleWidth() / 2, 0, thick, host.Form().ScaleHeight()));
+    EXPECT_EQ(PlaceOf(*host.SiteOf(bar)), PlaceText(Inner(host, "ScaleWidth") / 2, 0, thick, Inner(host, "ScaleHeight")));
     EXPECT_EQ(bar.Get("MousePointer"), Variant(9));
 }
 
@@ -85,7 +85,7 @@ TEST(SplitterPlacement, ABarIsPlacedWhenItIsFirstShownNotWhenItIsMade) {
     auto& site = *host.SiteOf(bar);
     EXPECT_EQ(PlaceOf(site), PlaceText(0, 0, 500, 300));
     site.SetVisible(true);
-    EXPECT_EQ(PlaceOf(site), PlaceText(0, host.Form().ScaleHeight() / 2, host.Form().ScaleWidth(), thick));
+    EXPECT_EQ(PlaceOf(site), PlaceText(0, Inner(host, "ScaleHeight") / 2, Inner(host, "ScaleWidth"), thick));
 }
 
 TEST(SplitterPlacement, APlacedBarIsKeptByItsBagWithItsPointer) {

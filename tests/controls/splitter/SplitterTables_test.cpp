@@ -370,7 +370,7 @@ TEST(SplitterTables, AValueThatDoesNotConvertFailsTheLoadAndLeavesNoControlBehin
          {"MinTopLeft", "MinBottomRight", "BackColor", "ForeColor", "Enabled", "Orientation", "MousePointer", "HighlightColor"}) {
         EXPECT_EQ(LoadError(host, key, "wide"), frame::errors::typeMismatch) << key;
         EXPECT_EQ(host.FindSite("Splitter1"), nullptr) << key;
-        EXPECT_EQ(host.Form().Count(), 0) << key;
+        EXPECT_EQ(host.OnForm().Count(), 0) << key;
     }
 }
 
@@ -385,7 +385,7 @@ TEST(SplitterTables, AnIconThatIsNoPictureFailsTheLoad) {
     HostUnderTest host;
     EXPECT_NE(LoadError(host, "MouseIcon", "hand.ico"), 0);
     EXPECT_EQ(LoadError(host, "MouseIcon", std::make_shared<frame::Font>()), frame::errors::typeMismatch);
-    EXPECT_EQ(host.Form().Count(), 0);
+    EXPECT_EQ(host.OnForm().Count(), 0);
 }
 
 // When the icon is reported the keys before it have been loaded and those behind it have not.

@@ -19,6 +19,7 @@
 #include "frame/Extender.h"
 #include "frame/Text.h"
 #include "hosts/headless/HeadlessHost.h"
+#include "tests/HostUnderTest.h"
 
 /// What the tests of the splitter share. It is reached through its table alone: by the names of its members and of its inputs.
 namespace tessel::controls::splittertest {
@@ -32,6 +33,9 @@ inline const frame::ControlClass& SplitterClass() {
     if (!found) throw std::logic_error("There is no class Splitter");
     return *found;
 }
+
+/// The inner size of the form: `ScaleWidth` or `ScaleHeight`, in twips.
+inline float Inner(test::HostUnderTest& host, std::string_view which) { return host.Form().Get(which).ToSingle(); }
 
 // Input to the bar's own surface.
 

@@ -134,6 +134,35 @@ TEST(RowOrderTest, ClearLeavesNothing) {
     ExpectIs(order, {4});
 }
 
+TEST(RowOrderTest, AnOrderThatWasFilledTakesAnyChangeAfterwards) {
+    constexpr RowId many = 1'300;  // of several chunks
+    for (const RowOrder::Position position : {0u, 1u, many / 2, many - 1}) {
+        RowOrder order = OrderOf(Upto(many));
+        Rows rows = Upto(many);
+        EXPECT_EQ(order.Remove(position), position);
+        rows.erase(rows.begin() + position);
+        ExpectIs(order, rows);
+        order.Insert(position / 2, position);
+        rows.insert(rows.begin() + position / 2, position);
+        ExpectIs(order, rows);
+        order.Append(many);
+        rows.push_back(many);
+        ExpectIs(order, rows);
+    }
+}
+
+TEST(RowOrderTest, TheLastRowMayGoAndAnotherComeInItsPlace) {
+    RowOrder order = OrderOf(Upto(600));
+    EXPECT_EQ(order.Remove(599), 599u);
+    EXPECT_EQ(order.Remove(598), 598u);
+    ExpectIs(order, Upto(598));
+    order.Append(599);
+    order.Append(598);
+    Rows rows = Upto(600);
+    std::swap(rows[598], rows[599]);
+    ExpectIs(order, rows);
+}
+
 TEST(RowOrderTest, BehavesAsAVectorThatGrowsShrinksAndHovers) {
     for (const unsigned seed : {1u, 2u, 3u}) {
         Model model(seed);

@@ -1,5 +1,3 @@
-#ifndef TESSEL_TESTED_ON_QT
-
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
@@ -187,5 +185,3 @@ TEST_F(SplitterOnForms, MakingAndShowingABarDrawsNothing) {
 
 }  // namespace
 }  // namespace tessel::controls
-
-#endif
