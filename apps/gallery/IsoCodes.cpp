@@ -10,6 +10,7 @@
 #include <QSqlError>
 #include <QSqlQuery>
 #include <QStandardPaths>
+#include <algorithm>
 
 namespace tessel::gallery {
 
@@ -36,14 +37,17 @@ class Writer {
         done_ = done_ && query_.exec();
     }
     bool Done() const { return done_; }
+    /// Why it is not.
+    QString Problem() const { return query_.lastError().text(); }
 
   private:
     QSqlQuery query_;
     bool done_ = true;
 };
 
-bool Fill(QSqlDatabase& database, const QJsonArray& countries, const QJsonArray& subdivisions, const QJsonArray& languages) {
-    if (!database.transaction()) return false;
+/// Gives what went wrong, or nothing.
+QString Fill(QSqlDatabase& database, const QJsonArray& countries, const QJsonArray& subdivisions, const QJsonArray& languages) {
+    if (!database.transaction()) return database.lastError().text();
     Writer writer(database);
     QHash<QString, int> numbers;  // of countries, by their two letters
     writer.Do("CREATE TABLE countries (id INTEGER PRIMARY KEY, name TEXT)");
@@ -66,9 +70,10 @@ bool Fill(QSqlDatabase& database, const QJsonArray& countries, const QJsonArray&
     writer.Do("CREATE TABLE languages (id INTEGER PRIMARY KEY, name TEXT)");
     writer.Prepare("INSERT INTO languages VALUES (?, ?)");
     for (const auto& entry : languages) writer.Add({++id, entry.toObject()["name"].toString()});
-    if (writer.Done() && database.commit()) return true;
+    if (writer.Done() && database.commit()) return {};
+    const QString problem = writer.Done() ? database.lastError().text() : writer.Problem();
     database.rollback();
-    return false;
+    return problem;
 }
 
 }  // namespace
@@ -81,12 +86,15 @@ QString OpenIsoCodes(QSqlDatabase& database) {
     database = QSqlDatabase::addDatabase("QSQLITE", "iso-codes-" + QString::number(place));
     database.setDatabaseName(folder.filePath("iso-codes.sqlite"));
     if (!database.open()) return Tr("The database of names cannot be opened: %1").arg(database.lastError().text());
-    if (database.tables().contains("languages")) return {};
+    const QStringList present = database.tables(), wanted = {"countries", "subdivisions", "languages"};
+    const auto isPresent = [&](const QString& table) { return present.contains(table); };
+    if (std::all_of(wanted.begin(), wanted.end(), isPresent)) return {};
     const QJsonArray countries = Entries("3166-1"), subdivisions = Entries("3166-2"), languages = Entries("639-3");
     if (countries.isEmpty() || subdivisions.isEmpty() || languages.isEmpty())
         return Tr("The names of countries and languages come from Debian's package iso-codes, which is not installed.");
-    if (Fill(database, countries, subdivisions, languages)) return {};
-    return Tr("The database of names cannot be written: %1").arg(database.lastError().text());
+    const QString problem = Fill(database, countries, subdivisions, languages);
+    if (problem.isEmpty()) return {};
+    return Tr("The database of names cannot be written: %1 (%2)").arg(problem, database.databaseName());
 }
 
 }  // namespace tessel::gallery

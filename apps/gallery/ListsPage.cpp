@@ -144,7 +144,12 @@ void ListsPage::fillSubdivisions() {
     QSqlQuery query(database_);
     query.prepare(country == 0 ? "SELECT id, name FROM subdivisions" : "SELECT id, name FROM subdivisions WHERE country = ?");
     if (country != 0) query.addBindValue(country);
-    if (!subdivisions_.list->populate(query, "name", "id", defaultText(), 0).isEmpty()) subdivisions_.list->clear();
+    if (!subdivisions_.list->populate(query, "name", "id", defaultText(), 0).isEmpty()) {
+        // A country without any.
+        subdivisions_.list->clear();
+        if (defaults_->isChecked()) subdivisions_.list->addItem(defaultText(), 0);
+        subdivisions_.list->setValue(0);
+    }
     tell(subdivisions_);
 }
 

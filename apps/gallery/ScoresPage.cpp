@@ -159,6 +159,7 @@ QWidget* ScoresPage::makeStyles() {
     for (const Choice& choice : styleChoices) {
         auto* card = new qt::ScoreCard;
         card->setStyle(static_cast<Style>(choice.value));
+        card->setAccessibleName(tr(choice.text));
         constexpr int cardSide = 24;
         if (choice.value >= qt::ScoreCard::FlashCard && choice.value <= qt::ScoreCard::GaugeRainbow)
             card->setFixedSize(choice.value == qt::ScoreCard::FlashCard ? QSize(cardSide, cardSide)
@@ -182,6 +183,7 @@ QWidget* ScoresPage::makeEditor() {
     auto* row = new QHBoxLayout(box);
     large_ = new qt::ScoreCard;
     large_->setObjectName("large");
+    large_->setAccessibleName(tr("Large score"));
     large_->setStyle(qt::ScoreCard::GaugeRainbow);
     fitLarge();
     slider_ = new QSlider(Qt::Horizontal);
@@ -222,15 +224,19 @@ void ScoresPage::addChoices(QFormLayout* form) {
     add("style", tr("&Style:"), styleChoices, [this](int value) {
         large_->setStyle(static_cast<Style>(value));
         fitLarge();
+        followPalette();
     });
     add("gaugeOrientation", tr("&Direction:"), orientationChoices, [this](int value) {
         large_->setGaugeOrientation(static_cast<qt::ScoreCard::tsGaugeOrientation>(value));
         fitLarge();
+        followPalette();
     });
     add("showMarker", tr("&Marker:"), markerChoices,
         [this](int value) { large_->setShowMarker(static_cast<qt::ScoreCard::tsMarkerStyle>(value)); });
-    add("showValue", tr("&Text:"), textChoices,
-        [this](int value) { large_->setShowValue(static_cast<qt::ScoreCard::tsShowValue>(value)); });
+    add("showValue", tr("&Text:"), textChoices, [this](int value) {
+        large_->setShowValue(static_cast<qt::ScoreCard::tsShowValue>(value));
+        followPalette();
+    });
 }
 
 /// A picture is as large as it is; all else gets a place of its own.
@@ -266,13 +272,14 @@ void ScoresPage::addThresholds(QFormLayout* form) {
     static constexpr Threshold thresholds[] = {{"ScoreStar", QT_TR_NOOP("St&ar from:")},
                                                {"ScoreGood", QT_TR_NOOP("&Good from:")},
                                                {"ScoreMaybe", QT_TR_NOOP("Ma&ybe from:")},
-                                               {"ScoreBad", QT_TR_NOOP("Ba&d from:")}};
+                                               {"ScoreBad", QT_TR_NOOP("Bad f&rom:")}};
     constexpr double step = 0.05;
     for (const Threshold& threshold : thresholds) {
         auto* box = new QDoubleSpinBox;
         box->setObjectName(threshold.property);
         box->setRange(0, 1);
         box->setSingleStep(step);
+        box->setKeyboardTracking(false);  // a number that is being typed is none yet
         box->setValue(large_->property(threshold.property).toDouble());
         connect(box, &QDoubleSpinBox::valueChanged, this, [this, box](double value) {
             large_->setProperty(box->objectName().toLatin1(), value);
@@ -290,6 +297,7 @@ void ScoresPage::followThresholds() {
         box->setValue(large_->property(box->objectName().toLatin1()).toDouble());
     }
     large_->setValue(large_->value());
+    followPalette();
 }
 
 void ScoresPage::setScore(double score) {
@@ -300,12 +308,32 @@ void ScoresPage::setScore(double score) {
     for (qt::ScoreCard* card : styles_) card->setValue(score);
 }
 
-/// The ticks cross the filled part and the empty one; the text is in the filled part from the middle on, which is light there.
+/// The ticks cross the filled part and the empty one, and so may the text: one colour reads well on both where the gauge is filled
+/// with a tint. In the colours of the grades it goes by where its middle stands.
 void ScoresPage::followPalette() {
     if (!large_) return;
-    constexpr double middle = 0.5;
+    const QColor base = palette().color(QPalette::Base), strong = palette().color(QPalette::Highlight);
+    large_->setForeColor(
+        QColor((base.red() + strong.red()) / 2, (base.green() + strong.green()) / 2, (base.blue() + strong.blue()) / 2));
     large_->setTickLineColor(palette().color(QPalette::PlaceholderText));
-    large_->setFontColor(large_->value().toDouble() < middle ? palette().color(QPalette::WindowText) : QColor(Qt::black));
+    const double score = large_->value().toDouble();
+    const bool filled = large_->style() == qt::ScoreCard::GaugeRainbow && middleOfText() < score;
+    const QColor inside = score < large_->scoreBad() ? Qt::white : Qt::black;
+    large_->setFontColor(filled ? inside : palette().color(QPalette::WindowText));
+}
+
+/// Where the text's middle stands along the gauge: 0 where it begins to fill, 1 at its other end.
+double ScoresPage::middleOfText() const {
+    using Card = qt::ScoreCard;
+    constexpr double middle = 0.5;
+    const bool stands = large_->gaugeOrientation() == Card::Vertical;
+    const auto begin = stands ? Card::AtBottom : Card::AtLeft, end = stands ? Card::AtTop : Card::AtRight;
+    auto where = large_->showValue();
+    if (where == Card::Adjust) where = large_->value().toDouble() < middle ? end : begin;
+    const QFontMetrics metrics(large_->font());
+    const double half =
+        stands ? metrics.height() / 2.0 / large_->height() : metrics.horizontalAdvance("50%") / 2.0 / large_->width();
+    return where == begin ? half : where == end ? 1 - half : middle;
 }
 
 // For pictures.

@@ -52,6 +52,7 @@ class ScoresPage final : public Page {
     void followThresholds();
     void fitLarge();
     void followPalette();
+    double middleOfText() const;
 
     QTimer* timer_ = nullptr;
     QGridLayout* machine_ = nullptr;
