@@ -54,7 +54,7 @@ void ComboRows::Remove(Position position) {
     if (dataIndexed_) UnindexData(row);
     if (textIndexed_) {
         const auto same = [&](RowId other) { return frame::EqualsNoCase(TextOf(other), TextOf(row)); };
-        byText_.Remove(row, same, [&](std::vector<RowId>& rows) { SortByPosition(rows); });
+        byText_.Remove(row, HashOf(TextOf(row)), same, [&](std::vector<RowId>& rows) { SortByPosition(rows); });
     }
     order_.Remove(position);
     textBytes_ -= TextStore::SizeOf(TextOf(row));
@@ -213,7 +213,7 @@ void ComboRows::IndexData(RowId row) const {
 }
 
 void ComboRows::UnindexData(RowId row) {
-    byData_.Remove(row, EveryRow, [&](std::vector<RowId>& rows) { SortByPosition(rows); });
+    byData_.Remove(row, HashOf(rows_[row].data), EveryRow, [&](std::vector<RowId>& rows) { SortByPosition(rows); });
 }
 
 /// Rows of one text stand in the order in which they were added, in either list.

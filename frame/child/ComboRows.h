@@ -13,8 +13,8 @@ namespace tessel::child {
 
 /// The rows of a drop-down list: a text and a 32-bit number each, in the order in which they were added or sorted stably by their
 /// texts without regard to case. Made for 100,000 rows: adding, removing and finding by number or by text cost the same however
-/// many rows there are; what is found is always the first in the order. A row takes some 22 bytes beside its text, and 40 more
-/// once rows have been looked for by number and by text.
+/// many rows there are; what is found is always the first in the order. A row takes some 14 bytes beside its text, 8 more
+/// where rows are sorted or have been removed, and 28 more once rows have been looked for by number and by text.
 class ComboRows {
   public:
     using Position = RowOrder::Position;

@@ -3,10 +3,27 @@
 #include <algorithm>
 #include <bit>
 #include <cassert>
+#include <numeric>
+#include <utility>
 
 namespace tessel::child {
 
 void RowOrder::Append(RowId row) {
+    if (plain_ && row == size_) {
+        ++size_;
+    } else {
+        Spread();
+        AppendToChunks(row);
+    }
+}
+
+/// From here on the ids stand in chunks.
+void RowOrder::Spread() {
+    if (!std::exchange(plain_, false)) return;
+    for (RowId row = 0, end = std::exchange(size_, 0); row < end; ++row) AppendToChunks(row);
+}
+
+void RowOrder::AppendToChunks(RowId row) {
     if (sequence_.empty() || ChunkAt(LastOrdinal()).rows.size() == capacity) AppendChunk();
     NoteChunk(row, sequence_.back());
     ChunkAt(LastOrdinal()).rows.push_back(row);
@@ -17,6 +34,7 @@ void RowOrder::Append(RowId row) {
 void RowOrder::Insert(Position position, RowId row) {
     assert(position <= size_);
     if (position == size_) return Append(row);
+    Spread();
     Place place = Find(position);
     if (ChunkAt(place.ordinal).rows.size() == capacity) {
         Split(place.ordinal);
@@ -30,6 +48,8 @@ void RowOrder::Insert(Position position, RowId row) {
 }
 
 RowId RowOrder::Remove(Position position) {
+    if (plain_ && position + 1 == size_) return --size_;
+    Spread();
     const Place place = Find(position);
     auto& rows = ChunkAt(place.ordinal).rows;
     const RowId row = rows[place.offset];
@@ -37,17 +57,20 @@ RowId RowOrder::Remove(Position position) {
     Count(place.ordinal, -1);
     --size_;
     MergeOrDrop(place.ordinal);
+    if (Empty()) Clear();
     return row;
 }
 
 void RowOrder::Clear() { *this = RowOrder(); }
 
 RowId RowOrder::At(Position position) const {
+    if (plain_) return position;
     const Place place = Find(position);
     return ChunkAt(place.ordinal).rows[place.offset];
 }
 
 RowOrder::Position RowOrder::PositionOf(RowId row) const {
+    if (plain_) return row;
     const Chunk& chunk = chunks_[chunkOf_[row]];
     if (chunk.rows.back() == row && chunk.ordinal == LastOrdinal()) return size_ - 1;
     const auto found = std::find(chunk.rows.begin(), chunk.rows.end(), row);
@@ -56,7 +79,11 @@ RowOrder::Position RowOrder::PositionOf(RowId row) const {
 }
 
 std::vector<RowId> RowOrder::All() const {
-    std::vector<RowId> all;
+    std::vector<RowId> all(plain_ ? size_ : 0);
+    if (plain_) {
+        std::iota(all.begin(), all.end(), RowId{0});
+        return all;
+    }
     all.reserve(size_);
     for (const ChunkId chunk : sequence_) all.insert(all.end(), chunks_[chunk].rows.begin(), chunks_[chunk].rows.end());
     return all;

@@ -12,8 +12,9 @@ namespace tessel::child {
 /// The order of the rows of a list: a sequence of row ids, each at most once, with positions from 0. Inserting, removing and
 /// both ways of looking up stay cheap with hundreds of thousands of rows; appending is the cheapest.
 ///
-/// The ids stand in chunks whose counts are summed in a binary indexed tree, so that a position is found through the tree and
-/// the position of an id through its chunk. About 8 bytes an id.
+/// As long as the ids are 0, 1, 2 and so on, as in a list that was filled and left so, nothing is kept but how many there are.
+/// After that they stand in chunks whose counts are summed in a binary indexed tree, so that a position is found through the tree
+/// and the position of an id through its chunk: about 8 bytes an id.
 class RowOrder {
   public:
     using Position = std::uint32_t;
@@ -49,6 +50,8 @@ class RowOrder {
         std::uint32_t offset;
     };
 
+    void Spread();
+    void AppendToChunks(RowId row);
     Chunk& ChunkAt(std::uint32_t ordinal) { return chunks_[sequence_[ordinal]]; }
     const Chunk& ChunkAt(std::uint32_t ordinal) const { return chunks_[sequence_[ordinal]]; }
     std::uint32_t LastOrdinal() const { return static_cast<std::uint32_t>(sequence_.size()) - 1; }
@@ -66,6 +69,7 @@ class RowOrder {
     Position Before(std::uint32_t ordinal) const;
     void RebuildCounts();
 
+    bool plain_ = true;  // each id is its position, and there are no chunks
     std::vector<Chunk> chunks_;
     std::vector<ChunkId> spare_;
     std::vector<ChunkId> sequence_;  // the chunks in their order
