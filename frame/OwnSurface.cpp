@@ -39,6 +39,7 @@ void OwnSurface::SetAppearance(std::int16_t value) {
 
 void OwnSurface::SetBorderStyle(std::int16_t value) {
     borderStyle_ = value;
+    Resized();
     LookChanged();
 }
 
@@ -54,13 +55,12 @@ void OwnSurface::Refresh() {
 }
 
 std::pair<float, float> OwnSurface::InputPoint(float x, float y) const {
-    const TextSize place = UnitsAt(x, y);
+    const TextSize place = UnitsAt(x - Border() / 2, y - Border() / 2);
     return {place.width, place.height};
 }
 
 TextSize OwnSurface::InnerSize() const {
-    const float border = borderStyle_ != 0 ? 2 * borderTwips : 0;
-    return {Width() > border ? Width() - border : 0, Height() > border ? Height() - border : 0};
+    return {Width() > Border() ? Width() - Border() : 0, Height() > Border() ? Height() - Border() : 0};
 }
 
 void OwnSurface::LookChanged() {

@@ -30,11 +30,14 @@ class OwnSurface final : public DrawingSurface, public KeyTarget {
     void SetBorderStyle(std::int16_t value);
     const PictureRef& Picture() const { return picture_; }
     void SetPicture(const PictureRef& value);
+    /// The control has another size: what the site says.
+    void SizeChanged() { Resized(); }
     /// Has the surface drawn anew: the control's `Paint` runs.
     void Refresh();
 
     frame::Host& InputHost() const override { return SurfaceHost(); }
     TextSize InputExtent() const override { return InnerSize(); }
+    /// From the inside of the border, in the surface's own scale.
     std::pair<float, float> InputPoint(float x, float y) const override;
 
   protected:
@@ -44,6 +47,8 @@ class OwnSurface final : public DrawingSurface, public KeyTarget {
     std::string InputPath() const override;
 
   private:
+    float Border() const { return borderStyle_ != 0 ? 2 * borderTwips : 0; }
+
     Control& control_;
     bool enabled_ = true;
     std::int16_t mousePointer_ = 0, appearance_ = 1, borderStyle_ = 0;

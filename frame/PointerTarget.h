@@ -16,7 +16,7 @@ namespace tessel::frame {
 /// whose names end in `Input`, through the one way in; the events go to the control.
 class PointerTarget {
   public:
-    // Coordinates are in twips of the child, in the surface's own scale for one that is drawn on. Buttons: 1 left, 2 right, 4
+    // Coordinates are in twips of the child, and in its own scale on a control's own surface. Buttons: 1 left, 2 right, 4
     // middle; in a move, the sum of those held. Shift: the sum of 1 Shift, 2 Ctrl, 4 Alt.
     void MouseDownInput(std::int16_t button, std::int16_t shift, float x, float y);
     void MouseMoveInput(std::int16_t button, std::int16_t shift, float x, float y);

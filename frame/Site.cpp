@@ -43,7 +43,9 @@ void Site::SetSize(float width, float height) {
     height_ = height;
     const Callout callout(host_);
     Sized();
-    if (control_) control_->Resize();
+    if (!control_) return;
+    control_->Surface().SizeChanged();
+    control_->Resize();
 }
 
 void Site::Adopt(std::unique_ptr<frame::Control> control) {
@@ -68,6 +70,7 @@ void Site::Start(const PropertyBag* saved, std::optional<float> width, std::opti
     width_ = extent(width.value_or(width_));
     height_ = extent(height.value_or(height_));
     Sized();
+    control_->Surface().SizeChanged();
     control_->Resize();
 }
 

@@ -1,5 +1,6 @@
 #include "frame/Surface.h"
 
+#include <algorithm>
 #include <array>
 
 #include "frame/Text.h"
@@ -56,7 +57,8 @@ void DrawingSurface::PSet(float x, float y, std::optional<OLE_COLOR> color) {
 
 std::int32_t DrawingSurface::Point(float x, float y) const {
     const Scale scale = PixelScale();
-    const auto color = PixelOf(PixelAt(scale.X(x)), PixelAt(scale.Y(y)));
+    const Canvas* const kept = Kept();
+    const auto color = kept ? kept->Pixel(PixelAt(scale.X(x)), PixelAt(scale.Y(y))) : std::nullopt;
     return color ? static_cast<std::int32_t>(color->value) : -1;
 }
 
@@ -185,6 +187,16 @@ void DrawingSurface::AddCanvas(std::unique_ptr<Canvas> canvas) {
     if (!canvas) return;
     AddCanvas(*canvas);
     ownCanvases_.push_back(std::move(canvas));
+}
+
+const Canvas* DrawingSurface::Kept() const {
+    const auto found = std::find_if(canvases_.begin(), canvases_.end(), [](const Canvas* canvas) { return canvas->KeepsPixels(); });
+    return found != canvases_.end() ? *found : nullptr;
+}
+
+PictureRef DrawingSurface::Image() const {
+    const Canvas* const kept = Kept();
+    return kept ? std::make_shared<Picture>(kept->Planes(), "") : std::make_shared<Picture>();
 }
 
 void DrawingSurface::Wipe(const PictureRef& picture) {

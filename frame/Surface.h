@@ -91,6 +91,9 @@ class DrawingSurface {
     const FontRef& Font() const { return font_.Get(); }
     void SetFont(const FontRef& value);
 
+    /// What the surface shows, as a picture of its own; an empty one where no canvas keeps pixels.
+    PictureRef Image() const;
+
     /// Those behind the system colours that it is drawn in.
     const SystemColors& Colors() const { return host_.Colors(); }
 
@@ -104,8 +107,8 @@ class DrawingSurface {
   protected:
     /// The inner size in twips.
     virtual TextSize InnerSize() const = 0;
-    /// RGB of a pixel, where the surface keeps pixels.
-    virtual std::optional<OLE_COLOR> PixelOf(int /*x*/, int /*y*/) const { return std::nullopt; }
+    /// The canvas whose pixels are read back: the first one that keeps them; null for none.
+    const Canvas* Kept() const;
     /// The surface has this picture behind the drawing from now on, or none; what was drawn is wiped.
     void Wipe(const PictureRef& picture);
     /// The picture behind the drawing.

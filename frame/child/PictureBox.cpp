@@ -7,13 +7,8 @@
 namespace tessel::child {
 
 PictureBox::PictureBox(frame::Control& owner, std::string name) : KeyChild(owner, std::move(name)), DrawingSurface(owner.Host()) {
-    std::unique_ptr<frame::Canvas> screen = owner.Host().Peers().MakeCanvas(*this, *this);
-    pixels_ = screen && screen->KeepsPixels() ? screen.get() : nullptr;
-    AddCanvas(std::move(screen));
-    if (pixels_) return;
-    auto raster = std::make_unique<Raster>(0, 0, BackColor());
-    pixels_ = raster.get();
-    AddCanvas(std::move(raster));
+    AddCanvas(owner.Host().Peers().MakeCanvas(*this, *this));
+    if (!Kept()) AddCanvas(std::make_unique<Raster>(0, 0, BackColor()));
 }
 
 void PictureBox::SetPicture(const frame::PictureRef& value) {
@@ -21,8 +16,6 @@ void PictureBox::SetPicture(const frame::PictureRef& value) {
     FitPicture();
     Changed();
 }
-
-frame::PictureRef PictureBox::Image() const { return std::make_shared<frame::Picture>(pixels_->Planes(), ""); }
 
 void PictureBox::SetAutoSize(bool value) {
     if (Store(autoSize_, value)) FitPicture();
@@ -33,15 +26,12 @@ void PictureBox::SetBorderStyle(std::int16_t value) {
 }
 
 std::pair<float, float> PictureBox::InputPoint(float x, float y) const {
-    const frame::TextSize place = UnitsAt(x - Border() / 2, y - Border() / 2);
-    return {place.width, place.height};
+    return {x - Border() / 2, y - Border() / 2};
 }
 
 frame::TextSize PictureBox::InnerSize() const {
     return {Width() > Border() ? Width() - Border() : 0, Height() > Border() ? Height() - Border() : 0};
 }
-
-std::optional<frame::OLE_COLOR> PictureBox::PixelOf(int x, int y) const { return pixels_->Pixel(x, y); }
 
 void PictureBox::FitPicture() {
     if (autoSize_ && Behind()) Move(Left(), Top(), Behind()->Width() + Border(), Behind()->Height() + Border());

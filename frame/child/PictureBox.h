@@ -15,10 +15,8 @@ class PictureBox final : public KeyChild, public frame::DrawingSurface {
     /// The picture behind what is drawn. A new one, or none, clears the drawing; with `AutoSize` the box takes its size.
     const frame::PictureRef& Picture() const { return Behind(); }
     void SetPicture(const frame::PictureRef& value);
-    /// What the box shows, as a picture of its own.
-    frame::PictureRef Image() const;
     /// The canvas that keeps what was drawn.
-    const frame::Canvas& Drawn() const { return *pixels_; }
+    const frame::Canvas& Drawn() const { return *Kept(); }
     bool AutoSize() const { return autoSize_; }
     void SetAutoSize(bool value);
     /// 0 none, any other number a border of two pixels on each side.
@@ -27,14 +25,13 @@ class PictureBox final : public KeyChild, public frame::DrawingSurface {
     std::int16_t MousePointer() const { return mousePointer_; }
     void SetMousePointer(std::int16_t value) { Store(mousePointer_, value); }
 
-    /// From the inside of the border, in the box's own scale.
+    /// From the inside of the border.
     std::pair<float, float> InputPoint(float x, float y) const override;
 
     const frame::ClassTable& Table() const override;
 
   protected:
     frame::TextSize InnerSize() const override;
-    std::optional<frame::OLE_COLOR> PixelOf(int x, int y) const override;
     void LookChanged() override { Changed(); }
     void Moved() override { Resized(); }
 
@@ -42,7 +39,6 @@ class PictureBox final : public KeyChild, public frame::DrawingSurface {
     float Border() const { return borderStyle_ != 0 ? 2 * frame::borderTwips : 0; }
     void FitPicture();
 
-    const frame::Canvas* pixels_;  // that are read back: the screen's, or a raster
     bool autoSize_ = false;
     std::int16_t borderStyle_ = 1, mousePointer_ = 0;
 };

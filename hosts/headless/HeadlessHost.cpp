@@ -1,12 +1,14 @@
 #include "hosts/headless/HeadlessHost.h"
 
 #include <algorithm>
+#include <optional>
 #include <utility>
 
 #include "frame/ClassTable.h"
 #include "frame/Extender.h"
 #include "frame/Text.h"
 #include "frame/child/ListView.h"
+#include "frame/child/Raster.h"
 #include "frame/child/TreeView.h"
 
 namespace tessel::headless {
@@ -136,16 +138,40 @@ void HeadlessForm::Remove(const Object& object) {
     *renamed_ = true;
 }
 
-/// Writes drawing operations into the log, in the units in which the surface received them.
+/// Writes drawing operations into the log, in the units in which the surface received them, and keeps the pixels. A surface that
+/// nobody draws on, and of which none is read, has no plane of them.
 class HeadlessHost::LoggingCanvas final : public frame::Canvas {
   public:
     LoggingCanvas(Log& log, frame::Object& owner) : log_(log), owner_(owner) {}
 
-    void Draw(const frame::DrawOp& op, const frame::Pen&, const frame::Scale&, frame::OLE_COLOR, frame::OLE_COLOR) override {
+    void Draw(const frame::DrawOp& op, const frame::Pen& pen, const frame::Scale& scale, frame::OLE_COLOR background,
+              frame::OLE_COLOR foreground) override {
         std::visit([this](const auto& operation) { log_.Add(EntryOf(operation)); }, op);
+        Plane().Draw(op, pen, scale, background, foreground);
     }
+    void Wipe(frame::OLE_COLOR background, const frame::PictureRef& picture) override {
+        background_ = background;
+        behind_ = picture;
+        if (plane_) plane_->Wipe(background, picture);
+    }
+    void Resize(int width, int height, frame::OLE_COLOR background) override {
+        width_ = width;
+        height_ = height;
+        background_ = background;
+        if (plane_) plane_->Resize(width, height, background);
+    }
+    bool KeepsPixels() const override { return true; }
+    std::optional<frame::OLE_COLOR> Pixel(int x, int y) const override { return Plane().Pixel(x, y); }
+    std::vector<frame::PixelPlane> Planes() const override { return Plane().Planes(); }
 
   private:
+    child::Raster& Plane() const {
+        if (!plane_) {
+            plane_.emplace(width_, height_, background_);
+            plane_->Wipe(background_, behind_);
+        }
+        return *plane_;
+    }
     static Variant Given(std::optional<float> value) { return value ? Variant(*value) : Variant(); }
     template <class... Values>
     Log::Entry Entry(const char* name, Values... values) const {
@@ -171,6 +197,10 @@ class HeadlessHost::LoggingCanvas final : public frame::Canvas {
 
     Log& log_;
     frame::Object& owner_;
+    int width_ = 0, height_ = 0;
+    frame::OLE_COLOR background_ = 0;
+    frame::PictureRef behind_;
+    mutable std::optional<child::Raster> plane_;
 };
 
 /// Tells of label edits that open; the list's own fixed rule answers for the screen.

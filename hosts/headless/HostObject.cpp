@@ -68,7 +68,6 @@ void HostObject::SetMember(std::string_view name, Variant value) {
 SurfaceObject::SurfaceObject(frame::Host& host, std::string path, Members members)
     : HostObject(std::move(path), {}), DrawingSurface(host) {
     AddCanvas(host.Peers().MakeCanvas(*this, *this));
-    AddCanvas(raster_);
     frame::TextSize size{12'000, 9'000};
     for (const auto& [name, value] : members) {
         if (frame::EqualsNoCase(name, "Width")) size.width = value.ToSingle();

@@ -9,7 +9,6 @@
 #include "frame/Object.h"
 #include "frame/Surface.h"
 #include "frame/Variant.h"
-#include "frame/child/Raster.h"
 
 namespace tessel::headless {
 
@@ -64,12 +63,10 @@ class SurfaceObject : public HostObject, public frame::DrawingSurface {
 
   protected:
     frame::TextSize InnerSize() const override { return inner_; }
-    std::optional<frame::OLE_COLOR> PixelOf(int x, int y) const override { return raster_.Pixel(x, y); }
   private:
     void SetInner(frame::TextSize size);
 
     frame::TextSize inner_;
-    child::Raster raster_{0, 0, 0};
 };
 
 }  // namespace tessel::headless

@@ -54,8 +54,10 @@ frame::PixelPlane PlaneAt(double scale, const child::Raster& raster) {
 /// How a stroke is drawn in the pixels of a screen, so that each of its pixels at scale 1 becomes the square of pixels that
 /// stands for it.
 struct Grid {
-    Grid(const frame::Pen& given, const frame::Scale& units, double screen)
-        : pen{std::max(1, static_cast<int>(std::lround(given.width * screen))), given.style, given.mode},
+    Grid(const frame::Pen& given, const frame::Scale& unitsGiven, double screenScale)
+        : units(unitsGiven),
+          screen(screenScale),
+          pen{std::max(1, static_cast<int>(std::lround(given.width * screen))), given.style, given.mode},
           scale{units.originX, units.originY, units.factorX * static_cast<float>(screen),
                 units.factorY * static_cast<float>(screen)},
           isThin(given.width == 1) {
@@ -75,6 +77,7 @@ struct Grid {
     }
     /// A thin line ends before its last pixel at scale 1; what is left may be one dot.
     std::variant<draw::Line, draw::PSet> Fitted(draw::Line line) const {
+        if (line.box == draw::Box::Filled && pen.style == draw::transparent) return Inside(line);
         line = {X(line.x1), Y(line.y1), X(line.x2), Y(line.y2), line.color, line.box};
         const float across = line.x2 - line.x1, down = line.y2 - line.y1;
         const float length = std::max(std::abs(across), std::abs(down));
@@ -86,6 +89,19 @@ struct Grid {
         return line;
     }
 
+    /// A filled box without an outline, around the squares of the pixels that an outline of width 1 encloses.
+    draw::Line Inside(const draw::Line& box) const {
+        const auto [left, right] = std::minmax({frame::PixelAt(units.X(box.x1)), frame::PixelAt(units.X(box.x2))});
+        const auto [top, bottom] = std::minmax({frame::PixelAt(units.Y(box.y1)), frame::PixelAt(units.Y(box.y2))});
+        constexpr int thinnest = 2;  // between the outer pixels
+        if (right - left < thinnest || bottom - top < thinnest) return {0, 0, 0, 0, box.color, draw::Box::None};
+        const auto begin = [&](int pixel) { return std::floor(static_cast<float>((pixel + 1) * screen)) - 1; };
+        const auto end = [&](int pixel) { return std::floor(static_cast<float>(pixel * screen)); };
+        return {begin(left), begin(top), end(right), end(bottom), box.color, box.box};
+    }
+
+    frame::Scale units;
+    double screen;
     frame::Pen pen;
     frame::Scale scale;
     bool isThin;
@@ -104,6 +120,7 @@ void SurfaceCanvas::ShowOn(QWidget* widget, QPoint corner) {
     if (shown_ == widget && corner_ == corner) return;
     shown_ = widget;
     corner_ = corner;
+    if (sizedByWidget_) TakeSize(SizeOfWidget());
     DamageAll();
 }
 
@@ -111,7 +128,7 @@ void SurfaceCanvas::Draw(const frame::DrawOp& op, const frame::Pen& pen, const f
                          OLE_COLOR) {
     if (IsPenChange(op)) return;  // each operation brings its pen
     if (std::holds_alternative<draw::Cls>(op)) return Wipe(background, behind_);
-    FollowWidget();
+    if (sizedByWidget_) TakeSize(SizeOfWidget());
     Stroke stroke{op, pen, scale, surface_.ForeColor(), {}};
     std::size_t bytes = 0;
     if (const auto* print = std::get_if<draw::Print>(&op)) {
@@ -127,7 +144,7 @@ void SurfaceCanvas::Draw(const frame::DrawOp& op, const frame::Pen& pen, const f
 }
 
 void SurfaceCanvas::Wipe(OLE_COLOR, const frame::PictureRef& picture) {
-    FollowWidget();
+    if (sizedByWidget_) TakeSize(SizeOfWidget());
     behind_ = picture;
     sizeAtFirst_ = size_;
     steps_.clear();
@@ -138,23 +155,24 @@ void SurfaceCanvas::Wipe(OLE_COLOR, const frame::PictureRef& picture) {
     DamageAll();
 }
 
-void SurfaceCanvas::Resize(int width, int height, OLE_COLOR) {
-    if (sizedByWidget_ || size_ == Size{width, height}) return;
-    size_ = {width, height};
-    if (steps_.empty() && !cut_)
-        sizeAtFirst_ = size_;
-    else
-        Keep(size_, 0);
-    DamageAll();
+void SurfaceCanvas::Resize(int width, int height, OLE_COLOR) { TakeSize(sizedByWidget_ ? SizeOfWidget() : Size{width, height}); }
+
+/// Less a border of the corner's size on each side.
+SurfaceCanvas::Size SurfaceCanvas::SizeOfWidget() const {
+    if (!shown_) return size_;
+    return {std::max(0, shown_->width() - 2 * corner_.x()), std::max(0, shown_->height() - 2 * corner_.y())};
 }
 
-void SurfaceCanvas::FollowWidget() {
-    if (!sizedByWidget_ || !shown_ || size_ == Size{shown_->width(), shown_->height()}) return;
-    size_ = {shown_->width(), shown_->height()};
-    if (steps_.empty() && !cut_)
+void SurfaceCanvas::TakeSize(Size size) {
+    if (size_ == size) return;
+    size_ = size;
+    if (steps_.empty() && !cut_) {
         sizeAtFirst_ = size_;
-    else
+        for (Plane& plane : planes_) plane.begun = false;
+    } else {
         Keep(size_, 0);
+    }
+    DamageAll();
 }
 
 void SurfaceCanvas::Keep(Step step, std::size_t bytes) {

@@ -24,7 +24,7 @@ class SurfaceCanvas final : public frame::Canvas {
   public:
     /// As large as the inside of its surface.
     explicit SurfaceCanvas(frame::DrawingSurface& surface) : surface_(surface) {}
-    /// As large as the widget that shows it.
+    /// As large as the inside of the widget that shows it.
     SurfaceCanvas(frame::DrawingSurface& surface, QWidget& shown) : surface_(surface), shown_(&shown), sizedByWidget_(true) {}
 
     /// The widget that shows the drawing from `corner` on; null for none.
@@ -69,7 +69,8 @@ class SurfaceCanvas final : public frame::Canvas {
     };
 
     void Keep(Step step, std::size_t bytes);
-    void FollowWidget();
+    Size SizeOfWidget() const;
+    void TakeSize(Size size);
     double ScreenScale() const;
     frame::OLE_COLOR Rgb(frame::OLE_COLOR color) const;
 

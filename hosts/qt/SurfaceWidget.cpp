@@ -41,7 +41,12 @@ void SurfaceWidget::Follow() {
         setCursor(CursorOf(surface.MousePointer(), surface.MouseIcon()));
     else
         setCursor(pointer_);
+    if (canvas) canvas->ShowOn(this, {Border(), Border()});
     update();
+}
+
+int SurfaceWidget::Border() const {
+    return control_->Surface().BorderStyle() != 0 ? static_cast<int>(frame::borderTwips / frame::twipsPerPixel) : 0;
 }
 
 void SurfaceWidget::DrawAnew() {
@@ -59,8 +64,9 @@ void SurfaceWidget::paintEvent(QPaintEvent*) {
     const frame::OwnSurface& surface = control_->Surface();
     QPainter painter(this);
     if (!IsSurroundings(surface.BackColor())) painter.fillRect(rect(), ToQt(surface.BackColor(), control_->Host().Colors()));
-    if (surface.Picture()) painter.drawImage(QPoint(), ToQt(*surface.Picture(), devicePixelRatioF()));
-    if (canvas) painter.drawImage(QPoint(), canvas->Image());
+    const QPoint corner(Border(), Border());
+    if (surface.Picture()) painter.drawImage(corner, ToQt(*surface.Picture(), devicePixelRatioF()));
+    if (canvas) painter.drawImage(corner, canvas->Image());
     if (surface.BorderStyle() != 0) {
         if (surface.Appearance() != 0)
             qDrawWinPanel(&painter, rect(), palette(), true);

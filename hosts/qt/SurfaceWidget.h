@@ -43,6 +43,7 @@ class SurfaceWidget final : public QWidget {
     void leaveEvent(QEvent* event) override;
 
   private:
+    int Border() const;  // in pixels; there must be a control
     QMouseEvent AtTruePlace(const QMouseEvent& event) const;
 
     frame::Control* control_ = nullptr;

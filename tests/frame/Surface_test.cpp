@@ -24,21 +24,30 @@ using test::ErrorOf;
 constexpr float nan = std::numeric_limits<float>::quiet_NaN();
 constexpr float infinity = std::numeric_limits<float>::infinity();
 
-/// 200 by 100 pixels, some of which are kept.
+/// Keeps some pixels, and nothing of what is drawn.
+class FewPixels final : public Canvas {
+  public:
+    void Draw(const DrawOp&, const Pen&, const Scale&, OLE_COLOR, OLE_COLOR) override {}
+    bool KeepsPixels() const override { return true; }
+    std::optional<OLE_COLOR> Pixel(int x, int y) const override {
+        const auto found = pixels.find({x, y});
+        return found != pixels.end() ? std::optional(found->second) : std::nullopt;
+    }
+    std::vector<PixelPlane> Planes() const override { return {PixelPlane{1, 1, 1, {0xFF123456}}}; }
+
+    std::map<std::pair<int, int>, OLE_COLOR> pixels;
+};
+
+/// 200 by 100 pixels.
 class SmallSurface final : public DrawingSurface {
   public:
     using DrawingSurface::DrawingSurface;
 
-    std::map<std::pair<int, int>, OLE_COLOR> pixels;
     TextSize inner{3000, 1500};
     int looks = 0;
 
   protected:
     TextSize InnerSize() const override { return inner; }
-    std::optional<OLE_COLOR> PixelOf(int x, int y) const override {
-        const auto found = pixels.find({x, y});
-        return found != pixels.end() ? std::optional(found->second) : std::nullopt;
-    }
     void LookChanged() override { ++looks; }
 };
 
@@ -58,7 +67,10 @@ class WatchingCanvas final : public Canvas {
 };
 
 struct Surfaces : testing::Test {
-    Surfaces() { surface.AddCanvas(canvas); }
+    Surfaces() {
+        surface.AddCanvas(canvas);
+        surface.AddCanvas(kept);
+    }
     std::vector<DrawOp> Drawn() { return std::exchange(canvas.operations, {}); }
     std::pair<float, float> Position() const { return {surface.CurrentX(), surface.CurrentY()}; }
     void GoTo(float x, float y) {
@@ -68,6 +80,7 @@ struct Surfaces : testing::Test {
 
     headless::HeadlessHost host;
     RecordingCanvas canvas;
+    FewPixels kept;
     SmallSurface surface{host.Frame()};
 };
 
@@ -380,7 +393,7 @@ TEST_F(Surfaces, PrintingAdvancesInItsUnitsFromItsOrigin) {
 // Pixels
 
 TEST_F(Surfaces, APointIsTheColorOfThePixelThatItFallsOn) {
-    surface.pixels[{2, 1}] = 0x123456;
+    kept.pixels[{2, 1}] = 0x123456;
     EXPECT_EQ(surface.Point(30, 15), 0x123456);
     EXPECT_EQ(surface.Point(44.9f, 29.9f), 0x123456);
     EXPECT_EQ(surface.Point(29.9f, 15), -1);
@@ -395,13 +408,30 @@ TEST_F(Surfaces, APointIsTheColorOfThePixelThatItFallsOn) {
 
 TEST_F(Surfaces, APointFallsOnThePixelTowardsMinusInfinity) {
     surface.SetScaleMode(Pixels);
-    surface.pixels[{-1, 0}] = 1;
+    kept.pixels[{-1, 0}] = 1;
     EXPECT_EQ(surface.Point(-0.5f, 0), 1);
 }
 
 TEST_F(Surfaces, APointThatIsNowhereIsNoColor) {
     for (const float place : {infinity, -infinity, 1e30f, -1e30f}) EXPECT_EQ(surface.Point(place, place), -1);
     EXPECT_EQ(surface.Point(nan, nan), -1);
+}
+
+TEST_F(Surfaces, TheImageIsWhatTheFirstCanvasWithPixelsKeeps) {
+    FewPixels second;
+    surface.AddCanvas(second);
+    second.pixels[{0, 0}] = 1;
+    EXPECT_EQ(surface.Point(0, 0), -1);
+    const PictureRef image = surface.Image();
+    ASSERT_NE(image->Plane(1), nullptr);
+    EXPECT_EQ(image->Plane(1)->pixels, std::vector<std::uint32_t>{0xFF123456});
+    surface.RemoveCanvas(second);
+}
+
+TEST_F(Surfaces, WithoutACanvasThatKeepsPixelsThereIsNone) {
+    surface.RemoveCanvas(kept);
+    EXPECT_EQ(surface.Point(0, 0), -1);
+    EXPECT_EQ(surface.Image()->Plane(1), nullptr);
 }
 
 TEST(PixelAt, StaysInBoundsForAnyValue) {

@@ -109,5 +109,11 @@ TEST_F(DrawingTest, APictureThatWasPaintedManyTimesIsThere) {
     EXPECT_TRUE(IsBlank());
 }
 
+TEST_F(DrawingTest, ABoxThatWasReadBeforeItGrewIsReadAllOver) {
+    EXPECT_EQ(box.Point(12, 0), -1);
+    box.Move(0, 0, 195, 120);
+    EXPECT_EQ(At(12, 7), white);
+}
+
 }  // namespace
 }  // namespace tessel::test::drawing

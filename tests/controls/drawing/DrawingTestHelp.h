@@ -35,6 +35,37 @@ class Easel final : public frame::Control {
     child::PictureBox Picture1{*this, "Picture1"};
 };
 
+inline OLE_COLOR PixelOf(const frame::DrawingSurface& surface, float x, float y) {
+    return OLE_COLOR(static_cast<std::uint32_t>(surface.Point(x, y)));
+}
+/// The pixels row by row: '.' white, 'r', 'g', 'b', 'k' the colours, '-' none, '?' another. The surface must be in pixels.
+inline std::string RowsOf(const frame::DrawingSurface& surface, int width, int height) {
+    constexpr std::uint32_t none = 0xFFFFFFFF;
+    const auto letter = [](OLE_COLOR color) {
+        if (color == white) return '.';
+        if (color == red) return 'r';
+        if (color == green) return 'g';
+        if (color == blue) return 'b';
+        if (color == OLE_COLOR(none)) return '-';
+        return color == black ? 'k' : '?';
+    };
+    std::string text;
+    for (int y = 0; y < height; ++y) {
+        for (int x = 0; x < width; ++x) text += letter(PixelOf(surface, static_cast<float>(x), static_cast<float>(y)));
+        text += '\n';
+    }
+    return text;
+}
+/// The pixels that are not white, as "x,y x,y".
+inline std::string TouchedIn(const frame::DrawingSurface& surface, int width, int height) {
+    std::string text;
+    for (int y = 0; y < height; ++y)
+        for (int x = 0; x < width; ++x)
+            if (PixelOf(surface, static_cast<float>(x), static_cast<float>(y)) != white)
+                text += (text.empty() ? "" : " ") + std::to_string(x) + "," + std::to_string(y);
+    return text;
+}
+
 /// A white box of 12 by 8 pixels without a border, in pixels.
 class DrawingTest : public testing::Test {
   protected:
@@ -50,26 +81,9 @@ class DrawingTest : public testing::Test {
     /// The operations since the last time.
     Operations Recorded() { return std::exchange(canvas_.operations, {}); }
 
-    OLE_COLOR At(float x, float y) const { return OLE_COLOR(static_cast<std::uint32_t>(box.Point(x, y))); }
-    /// The pixels row by row: '.' white, 'r', 'g', 'b', 'k' the colours, '?' another. The box must be in pixels.
-    std::string Rows() const {
-        std::string text;
-        for (float y = 0; y < box.ScaleHeight(); ++y) {
-            for (float x = 0; x < box.ScaleWidth(); ++x) text += Letter(At(x, y));
-            text += '\n';
-        }
-        return text;
-    }
-    /// The pixels in rows and columns that are not white, as "x,y x,y".
-    std::string Touched() const {
-        std::string text;
-        for (float y = 0; y < box.ScaleHeight(); ++y)
-            for (float x = 0; x < box.ScaleWidth(); ++x)
-                if (At(x, y) != white)
-                    text +=
-                        (text.empty() ? "" : " ") + std::to_string(static_cast<int>(x)) + "," + std::to_string(static_cast<int>(y));
-        return text;
-    }
+    OLE_COLOR At(float x, float y) const { return PixelOf(box, x, y); }
+    std::string Rows() const { return RowsOf(box, static_cast<int>(box.ScaleWidth()), static_cast<int>(box.ScaleHeight())); }
+    std::string Touched() const { return TouchedIn(box, static_cast<int>(box.ScaleWidth()), static_cast<int>(box.ScaleHeight())); }
     bool IsBlank() const { return Touched().empty(); }
     std::pair<float, float> Position() const { return {box.CurrentX(), box.CurrentY()}; }
 
@@ -78,14 +92,6 @@ class DrawingTest : public testing::Test {
     child::PictureBox& box = easel.Picture1;
 
   private:
-    static char Letter(OLE_COLOR color) {
-        if (color == white) return '.';
-        if (color == red) return 'r';
-        if (color == green) return 'g';
-        if (color == blue) return 'b';
-        return color == black ? 'k' : '?';
-    }
-
     frame::RecordingCanvas canvas_;
 };
 

@@ -168,6 +168,94 @@ TEST_F(PictureBoxPeerTest, XorTwiceLeavesTheScreenAsItWas) {
     }
 }
 
+TEST_F(PictureBoxPeerTest, XorTwiceWithAWidePenLeavesTheScreenAsItWas) {
+    frame::OwnSurface& own = easel.Surface();
+    own.SetScaleMode(ScaleModeConstants::Pixels);
+    own.SetBackColor(white);
+    const auto look = [&] {
+        screen.Settle();
+        return screen.widget->grab().toImage();
+    };
+    using Shape = void (*)(frame::DrawingSurface&);
+    constexpr Shape shapes[] = {
+        [](frame::DrawingSurface& surface) { surface.Line(0, 0, 30, 17, white); },
+        [](frame::DrawingSurface& surface) { surface.Line(30, 9, 2, 9, white); },
+        [](frame::DrawingSurface& surface) { surface.Line(3, 3, 30, 30, white, draw::Box::Outline); },
+        [](frame::DrawingSurface& surface) { surface.Line(5, 5, 15, 15, white, draw::Box::Filled); },
+        [](frame::DrawingSurface& surface) { surface.Circle(20, 20, 9, white); },
+        [](frame::DrawingSurface& surface) { surface.Circle(20, 20, 11, white, 0.5f, 4.0f, 0.5f); },
+        [](frame::DrawingSurface& surface) { surface.PSet(40, 4, white); },
+    };
+    for (frame::DrawingSurface* surface : {static_cast<frame::DrawingSurface*>(&box), static_cast<frame::DrawingSurface*>(&own)}) {
+        surface->SetDrawMode(draw::copyPen);
+        surface->SetDrawWidth(1);
+        surface->Line(10, 10, 20, 20, blue, draw::Box::Filled);
+        const QImage before = look();
+        const frame::PictureRef image = surface->Image();
+        surface->SetDrawMode(draw::xorPen);
+        for (const std::int16_t width : {2, 5}) {
+            surface->SetDrawWidth(width);
+            for (std::size_t i = 0; i < std::size(shapes); ++i) {
+                shapes[i](*surface);
+                EXPECT_FALSE(look() == before) << i << " shows, with a pen of " << width;
+                shapes[i](*surface);
+                EXPECT_TRUE(look() == before) << i << ", with a pen of " << width;
+                EXPECT_TRUE(surface->Image()->EqualsObject(*image)) << i << ", with a pen of " << width;
+            }
+        }
+    }
+}
+
+TEST_F(PictureBoxPeerTest, AFilledBoxWithoutAnOutlineIsTheSquaresOfThePixelsInsideOnly) {
+    // On a screen of one and a half, too, these squares begin and end between two of its pixels.
+    constexpr int left = 3, top = 5, right = 10, bottom = 12;
+    const auto edge = [&](int pixel) { return static_cast<int>(std::lround((border + pixel) * Scale())); };
+    const QRect inside(QPoint(edge(left + 1), edge(top + 1)), QPoint(edge(right) - 1, edge(bottom) - 1));
+    box.SetDrawStyle(draw::transparent);
+    for (const std::int16_t width : {1, 2, 5}) {
+        for (const bool backwards : {false, true}) {
+            box.Cls();
+            box.SetDrawWidth(width);
+            if (backwards)
+                box.Line(right, bottom, left, top, red, draw::Box::Filled);
+            else
+                box.Line(left, top, right, bottom, red, draw::Box::Filled);
+            const QImage seen = Seen();
+            QRect filled;
+            int count = 0, mixed = 0;
+            for (int y = edge(0); y < edge(boxHeight - 2 * border); ++y) {
+                for (int x = edge(0); x < edge(boxWidth - 2 * border); ++x) {
+                    const QColor color = seen.pixelColor(x, y);
+                    mixed += color != QColor(Qt::red) && color != QColor(Qt::white) ? 1 : 0;
+                    if (color != QColor(Qt::red)) continue;
+                    ++count;
+                    filled |= QRect(x, y, 1, 1);
+                }
+            }
+            EXPECT_EQ(filled, inside) << "with a pen of " << width;
+            EXPECT_EQ(count, inside.width() * inside.height()) << "with a pen of " << width;
+            EXPECT_EQ(mixed, 0);
+            EXPECT_EQ(box.Point(left + 1, top + 1), static_cast<int>(red.value));
+            EXPECT_EQ(box.Point(right - 1, bottom - 1), static_cast<int>(red.value));
+            EXPECT_EQ(box.Point(left, top + 1), static_cast<int>(white.value));
+            EXPECT_EQ(box.Point(right, bottom - 1), static_cast<int>(white.value));
+            EXPECT_EQ(box.Point(left + 1, bottom), static_cast<int>(white.value));
+        }
+    }
+}
+
+TEST_F(PictureBoxPeerTest, ABoxWithoutAnOutlineAndWithoutAnInsideShowsNothing) {
+    const QImage before = Seen();
+    box.SetDrawStyle(draw::transparent);
+    box.Line(20, 5, 21, 12, red, draw::Box::Filled);
+    box.Line(30, 5, 30, 12, red, draw::Box::Filled);
+    box.Line(5, 20, 12, 20, red, draw::Box::Filled);
+    box.Line(5, 25, 12, 24, red, draw::Box::Filled);
+    EXPECT_TRUE(Seen() == before);
+    box.Line(20, 5, 22, 12, red, draw::Box::Filled);
+    EXPECT_FALSE(Seen() == before) << "one pixel inside is one column";
+}
+
 TEST_F(PictureBoxPeerTest, PointAndImageHaveThePrintedText) {
     box.SetForeColor(blue);
     box.SetCurrentX(2);
@@ -239,6 +327,33 @@ TEST_F(PictureBoxPeerTest, AControlsOwnSurfaceIsWipedToo) {
     EXPECT_EQ(PixelOf(*screen.widget, 1, 1), QColor(Qt::green));
 }
 
+TEST_F(PictureBoxPeerTest, AControlsOwnSurfaceIsReadBackAtScaleOneAndAtTheScreens) {
+    frame::OwnSurface& surface = easel.Surface();
+    surface.SetScaleMode(ScaleModeConstants::Pixels);
+    surface.SetBackColor(white);
+    EXPECT_EQ(surface.Point(0, 0), static_cast<int>(white.value)) << "before anything is drawn";
+    EXPECT_EQ(surface.Point(99, 99), static_cast<int>(white.value));
+    surface.Line(80, 80, 89, 89, red, draw::Box::Filled);
+    EXPECT_EQ(surface.Point(89, 89), static_cast<int>(red.value));
+    EXPECT_EQ(surface.Point(90, 90), static_cast<int>(white.value));
+    EXPECT_EQ(surface.Point(100, 0), -1);
+    const frame::PictureRef image = surface.Image();
+    const frame::PixelPlane* plain = image->Plane(1);
+    ASSERT_TRUE(plain);
+    EXPECT_EQ(plain->scale, 1);
+    ASSERT_EQ(plain->width, 100);
+    ASSERT_EQ(plain->height, 100);
+    EXPECT_EQ(std::count(plain->pixels.begin(), plain->pixels.end(), 0xFF0000FFu), 100);
+    const frame::PixelPlane* sharp = image->Plane(Scale());
+    ASSERT_TRUE(sharp);
+    EXPECT_EQ(sharp->scale, Scale());
+    ASSERT_EQ(sharp->width, static_cast<int>(std::ceil(100 * Scale())));
+    const auto side = std::lround(10 * Scale());  // of the box, which begins and ends between two pixels of the screen
+    EXPECT_EQ(std::count(sharp->pixels.begin(), sharp->pixels.end(), 0xFF0000FFu), side * side);
+    EXPECT_EQ(PixelOf(*screen.widget, 89, 89), QColor(Qt::red)) << "which is what shows";
+    EXPECT_EQ(PixelOf(*screen.widget, 90, 90), QColor(Qt::white));
+}
+
 TEST_F(PictureBoxPeerTest, TheBorderIsDarkerAboveAndLighterBelowOnAnyGround) {
     const QPalette before = QApplication::palette();
     for (const int grey : {239, 60}) {
@@ -257,15 +372,19 @@ TEST_F(PictureBoxPeerTest, TheBorderIsDarkerAboveAndLighterBelowOnAnyGround) {
     EXPECT_EQ(Seen().pixelColor(0, 0), QColor(Qt::red));
 }
 
-TEST_F(PictureBoxPeerTest, TheMouseIsReportedInTheScaleOfTheInside) {
-    QTest::mousePress(shown, Qt::LeftButton, {}, {12, 7});
-    QTest::mouseRelease(shown, Qt::LeftButton, {}, {13, 7});
-    EXPECT_THAT(easel.heard, testing::ElementsAre("down 1 at 10,5", "up at 11,5", "click"));
+TEST_F(PictureBoxPeerTest, TheMouseIsReportedInTwipsFromTheInsideOfTheBorderInAnyScale) {
+    for (const auto scale : {ScaleModeConstants::Pixels, ScaleModeConstants::Twips, ScaleModeConstants::Inches}) {
+        box.SetScaleMode(scale);
+        easel.heard.clear();
+        QTest::mousePress(shown, Qt::LeftButton, {}, {12, 7});
+        QTest::mouseRelease(shown, Qt::LeftButton, {}, {13, 7});
+        EXPECT_THAT(easel.heard, testing::ElementsAre("down 1 at 150,75", "up at 165,75", "click"));
+    }
     easel.heard.clear();
-    box.SetScaleMode(ScaleModeConstants::Twips);
+    box.SetBorderStyle(0);
     QTest::mousePress(shown, Qt::RightButton, {}, {12, 7});
     QTest::mouseRelease(shown, Qt::RightButton, {}, {12, 7});
-    EXPECT_THAT(easel.heard, testing::ElementsAre("down 2 at 150,75", "up at 150,75"));
+    EXPECT_THAT(easel.heard, testing::ElementsAre("down 2 at 180,105", "up at 180,105"));
 }
 
 TEST_F(PictureBoxPeerTest, AClickGivesTheFocusAndKeysAreReported) {
@@ -331,13 +450,21 @@ int InkedRows(const QImage& image, int column) {
     return rows;
 }
 
-TEST(SurfaceCanvas, IsDrawnAnewForAScreenOfAnotherScale) {
-    const auto host = Host::make();
-    Paper paper(host->frameHost());
+class SurfaceCanvasTest : public testing::Test {
+  protected:
+    SurfaceCanvasTest() {
+        canvas.ShowOn(&widget, {});
+        paper.AddCanvas(canvas);
+    }
+    ~SurfaceCanvasTest() override { paper.RemoveCanvas(canvas); }
+
+    const std::shared_ptr<Host> host = Host::make();
+    Paper paper{host->frameHost()};
     Movable widget;
-    SurfaceCanvas canvas(paper);
-    canvas.ShowOn(&widget, {});
-    paper.AddCanvas(canvas);
+    SurfaceCanvas canvas{paper};
+};
+
+TEST_F(SurfaceCanvasTest, IsDrawnAnewForAScreenOfAnotherScale) {
     EXPECT_TRUE(canvas.Image().isNull()) << "nothing was drawn";
     paper.Line(0, 3, 20, 3, red);
     EXPECT_EQ(canvas.Image().size(), QSize(20, 10));
@@ -348,16 +475,30 @@ TEST(SurfaceCanvas, IsDrawnAnewForAScreenOfAnotherScale) {
     EXPECT_EQ(canvas.Image().devicePixelRatio(), 2);
     paper.Cls();
     EXPECT_TRUE(canvas.Image().isNull());
-    paper.RemoveCanvas(canvas);
 }
 
-TEST(SurfaceCanvas, ThatWasDrawnOnWithoutEndIsScaled) {
-    const auto host = Host::make();
-    Paper paper(host->frameHost());
-    Movable widget;
-    SurfaceCanvas canvas(paper);
-    canvas.ShowOn(&widget, {});
-    paper.AddCanvas(canvas);
+TEST_F(SurfaceCanvasTest, ABoxWithoutAnOutlineFillsItsInsideAtEveryScale) {
+    paper.SetDrawStyle(draw::transparent);
+    for (const int scale : {1, 2, 3, 4}) {
+        widget.scale = scale;
+        paper.Cls();
+        paper.Line(2, 1, 6, 4, red, draw::Box::Filled);
+        int inked = 0;
+        for (int x = 0; x < 20 * scale; ++x) inked += InkedRows(canvas.Image(), x);
+        EXPECT_EQ(inked, 3 * 2 * scale * scale) << scale;
+        EXPECT_EQ(canvas.Image().pixelColor(3 * scale, 2 * scale), QColor(Qt::red)) << scale;
+        EXPECT_EQ(canvas.Image().pixelColor(6 * scale - 1, 4 * scale - 1), QColor(Qt::red)) << scale;
+        paper.Cls();
+        paper.Line(8, 1, 8, 4, red, draw::Box::Filled);
+        paper.Line(2, 6, 6, 6, red, draw::Box::Filled);
+        paper.Line(12, 1, 13, 4, red, draw::Box::Filled);
+        inked = 0;
+        for (int x = 0; x < 20 * scale; ++x) inked += InkedRows(canvas.Image(), x);
+        EXPECT_EQ(inked, 0) << "where there is no inside nothing shows, at " << scale;
+    }
+}
+
+TEST_F(SurfaceCanvasTest, ThatWasDrawnOnWithoutEndIsScaled) {
     paper.Line(0, 2, 20, 6, red, draw::Box::Filled);
     constexpr int passes = 60'000;
     for (int pass = 0; pass < passes; ++pass) paper.PSet(15, 4, red);
@@ -370,7 +511,6 @@ TEST(SurfaceCanvas, ThatWasDrawnOnWithoutEndIsScaled) {
     paper.Cls();
     paper.Line(0, 3, 20, 3, red);
     EXPECT_EQ(InkedRows(canvas.Image(), 10), 2) << "and so is all after clearing";
-    paper.RemoveCanvas(canvas);
 }
 
 }  // namespace
