@@ -148,7 +148,10 @@ std::int16_t Variant::ToInteger() const {
     return IsString() ? ReadInteger(Text()) : Rounded<std::int16_t>(ToDouble());
 }
 
-std::int32_t Variant::ToLong() const { return Rounded<std::int32_t>(ToDouble()); }
+std::int32_t Variant::ToLong() const {
+    if (const auto* number = std::get_if<std::int32_t>(&value_)) return *number;
+    return Rounded<std::int32_t>(ToDouble());
+}
 
 float Variant::ToSingle() const {
     const double value = ToDouble();

@@ -68,6 +68,14 @@ void Populate(benchmark::State& state) {
         });
         const auto& rows = list->control().listItems[0];
         bench::Expect(state, rows.ListCount(), count);
+        auto unique = std::make_unique<DataList>();
+        unique->setOnlyUniqueValues(true);
+        contest.Figure("own_unique_ms", bench::Contest::Time([&] {
+                           QSqlQuery query = Rows(count);
+                           unique->populate(query, "name", "id");
+                       }));
+        bench::Expect(state, unique->control().listItems[0].ListCount(), count);
+        unique.reset();
         std::size_t text = 0;
         for (std::int32_t i = 0; i < rows.ListCount(); ++i) text += rows.List(i).size();
         contest.Figure("bytes_a_row", static_cast<double>(bench::liveBytes - before - text) / static_cast<double>(count));
@@ -126,7 +134,15 @@ void InsertUniqueValues(benchmark::State& state) {
                 if (!rows.HasData(row)) rows.Add(text, row);
         });
         bench::Expect(state, rows.ListCount(), count);
+        // As many as this are looked for among as many, so that the time of all rows is the square of the share.
+        constexpr int share = 50;
+        auto combo = std::make_unique<QComboBox>();
+        contest.Peer("findData", [&] {
+            for (int row = 0; row < count / share; ++row)
+                if (combo->findData(row) < 0) combo->addItem(QString::fromStdString(text), row);
+        });
     }
+    state.SetLabel("findData inserts a fiftieth of them");
 }
 BENCHMARK(InsertUniqueValues)->Arg(100'000)->UseManualTime()->Iterations(7)->Unit(benchmark::kMillisecond);
 

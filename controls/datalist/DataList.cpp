@@ -10,7 +10,6 @@ namespace tessel::controls {
 using child::ComboList;
 using frame::OLE_COLOR;
 using frame::ResumeNext;
-using frame::Status;
 using frame::Variant;
 using frame::VarType;
 
@@ -80,8 +79,8 @@ std::string DataList::Populate(const frame::ObjectRef& ListRecordset, const Vari
 std::string DataList::AddRows(frame::RecordReader& records, std::size_t textColumn, std::size_t valueColumn) {
     constexpr int tooMany = 2;
     std::string text;
+    ResumeNext test, row, step;
     for (int failures = 0;;) {
-        ResumeNext test, row, step;
         if (test.Value([&] { return records.AtEnd(); }, false)) return {};
         if (test.Failed() && ++failures == tooMany) return test.Description();
         row([&] {
@@ -90,7 +89,12 @@ std::string DataList::AddRows(frame::RecordReader& records, std::size_t textColu
         });
         step([&] { records.MoveNext(); });
         if (step.Failed() && ++failures == tooMany) return step.Description();
-        if (!test.Failed() && !step.Failed()) failures = 0;
+        if (!test.Failed() && !step.Failed()) {
+            failures = 0;
+            continue;
+        }
+        test.Clear();
+        step.Clear();
     }
 }
 
@@ -310,7 +314,7 @@ std::string DataList::AddText(std::string_view text, const Variant& value) {
         next([&] { message = "Item with value " + value.ToText() + " already exists."; });
         return message;
     }
-    next([&] { return CountItem(); });
+    CountItem();
     const std::int32_t data = next.Value([&] { return value.ToLong(); }, 0);
     if (own.Style == DataListStyleConstants::ID_and_Text || own.Style == DataListStyleConstants::Count_and_Text) {
         const std::string displayed = next.Value([&] { return Displayed(text, value); }, {});
@@ -321,10 +325,8 @@ std::string DataList::AddText(std::string_view text, const Variant& value) {
     return {};
 }
 
-Status DataList::CountItem() {
-    if (own.itemCounter == std::numeric_limits<std::int16_t>::max()) return frame::errors::overflow;
-    ++own.itemCounter;
-    return {};
+void DataList::CountItem() {
+    if (own.itemCounter < std::numeric_limits<std::int16_t>::max()) ++own.itemCounter;
 }
 
 std::string DataList::Displayed(std::string_view text, const Variant& value) const {

@@ -113,7 +113,7 @@ class DataList final : public frame::Control {
     std::string AddText(std::string_view text, const frame::Variant& value);
     void AddDefaultPair(const frame::Variant& text, const std::optional<frame::Variant>& value);
     std::string AddRows(frame::RecordReader& records, std::size_t textColumn, std::size_t valueColumn);
-    frame::Status CountItem();
+    void CountItem();
     std::string Displayed(std::string_view text, const frame::Variant& value) const;
     std::string SelectDefault();
     void MoveItems(child::ComboList& from, child::ComboList& to);

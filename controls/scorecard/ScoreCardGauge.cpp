@@ -1,3 +1,4 @@
+#include <cmath>
 #include <limits>
 
 #include "controls/scorecard/ScoreCard.h"
@@ -103,8 +104,9 @@ void ScoreCard::DrawRaisedBar() {
 }
 
 void ScoreCard::PrintValue() {
-    const double where = own.ShowValue.ToDouble();
-    if (!(where >= static_cast<double>(tsShowValue::AtLeft) && where <= static_cast<double>(tsShowValue::Adjust))) return;
+    const double number = own.ShowValue.ToDouble();
+    const bool isPlace = number >= static_cast<double>(tsShowValue::AtLeft) && number <= static_cast<double>(tsShowValue::Adjust);
+    if (!isPlace || number != std::trunc(number)) return;
     const std::string text = PercentText(own.Value);
     // Half the range, not the middle of it: kept so that saved designs print their text in the same place.
     const bool low = IsBelow(own.Value, (own.ScoreMax.ToDouble() - own.ScoreMin.ToDouble()) / 2);

@@ -31,6 +31,13 @@ void PointerInput::Move(const QMouseEvent& event) {
     if (!target_) return;
     inside_ = widget_.rect().contains(event.position().toPoint());
     const auto [x, y] = PointOf(event);
+    // Another window had the release: a box that came meanwhile.
+    for (const Qt::MouseButton button : {Qt::LeftButton, Qt::RightButton, Qt::MiddleButton}) {
+        if (!target_ || !(held_ & button) || (event.buttons() & button)) continue;
+        held_ &= ~Qt::MouseButtons(button);
+        target_->MouseUpInput(ButtonsOf(button), ShiftOf(event.modifiers()), x, y);
+    }
+    if (!target_) return;
     target_->MouseMoveInput(ButtonsOf(event.buttons()), ShiftOf(event.modifiers()), x, y);
 }
 

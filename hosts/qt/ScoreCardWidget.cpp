@@ -108,7 +108,7 @@ QSize ScoreCardWidget::minimumSizeHint() const {
 
 bool ScoreCardWidget::sizesItself() const {
     const Style style = scoreCard().Style();
-    return style < Style::FlashCard || style == Style::WeatherSmall || style == Style::WeatherLarge;
+    return (style >= Style::ScoreCardSmall && style < Style::FlashCard) || style == Style::WeatherSmall || style == Style::WeatherLarge;
 }
 
 // A score is nothing to stop at on the way by the Tab key, unless a program wants its keys.

@@ -34,6 +34,12 @@ SqlRecordset::SqlRecordset(const QString& table, const QSqlDatabase& database) :
 }
 
 void SqlRecordset::MoveFirst() {
+    record_ = {};
+    hasRow_ = false;
+    if (query_.isActive() && !query_.isSelect()) {  // it has no rows, and is not done again
+        atEnd_ = true;
+        WantRow();
+    }
     const bool fresh = query_.isActive() && query_.isSelect() && query_.at() == QSql::BeforeFirstRow;
     if (!fresh && (!query_.isActive() || query_.isForwardOnly())) Run();
     hasRow_ = query_.isForwardOnly() ? query_.next() : query_.first();
@@ -43,8 +49,6 @@ void SqlRecordset::MoveFirst() {
 }
 
 void SqlRecordset::Run() {
-    record_ = {};
-    hasRow_ = false;
     query_.setForwardOnly(true);
     const bool done = query_.boundValues().isEmpty() ? query_.exec(query_.lastQuery()) : query_.exec();
     if (!done) Fail();
@@ -80,10 +84,8 @@ void SqlRecordset::FieldText(std::int32_t field, std::string& text) {
     char* const to = text.data();
     const qsizetype size = wide.size();
     ushort all = 0;
-    for (qsizetype i = 0; i < size; ++i) {
-        all |= from[i];
-        to[i] = static_cast<char>(from[i]);
-    }
+    for (qsizetype i = 0; i < size; ++i) all |= from[i];
+    for (qsizetype i = 0; i < size; ++i) to[i] = static_cast<char>(from[i]);
     if (all >= firstBeyondAscii) text = FromQt(wide);
 }
 

@@ -12,7 +12,7 @@ namespace tessel::qt {
 /// the database's own text.
 ///
 /// `MoveFirst` runs a query that has not yet run, or that cannot go back; one that the recordset runs by itself goes forward
-/// only, so that the driver keeps no rows.
+/// only, so that the driver keeps no rows. A statement that gave no rows is not run again: it has no first row.
 class SqlRecordset final : public frame::Recordset {
   public:
     /// `query` must outlive the recordset, and stands where that leaves it.

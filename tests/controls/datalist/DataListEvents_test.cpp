@@ -125,11 +125,45 @@ TEST_F(DataListEvents, AnErrorOfAHandlerOfTheUsersInputReachesTheHost) {
     EXPECT_EQ(stage.host.errors.reports[0].error.Number(), applicationError);
 }
 
-// Handlers that change the control.
+// The setter of Text goes no further than its failing statement.
+
+TEST_F(DataListEvents, AnErrorOfAHandlerWhileTextIsSetReachesTheSetterAndTheTextIsNotStored) {
+    stage.Put("Text", "red");
+    stage.Reset();
+    stage.AtEvent([] { throw frame::ControlError(applicationError); });
+    EXPECT_EQ(ErrorOf([&] { stage.Put("Text", "BLUE"); }), applicationError);
+    EXPECT_EQ(stage.Happened(), "Click");
+    EXPECT_EQ(stage.Saved("Text"), Variant("red"));
+    EXPECT_EQ(stage.ListIndex(), 1);
+    EXPECT_EQ(stage.LabelText(), "Blue");
+    EXPECT_TRUE(stage.host.errors.reports.empty());
+    stage.Put("Text", "BLUE");
+    EXPECT_EQ(stage.Happened(), "Click changed Text");
+    EXPECT_EQ(stage.Saved("Text"), Variant("BLUE"));
+}
+
+TEST_F(DataListEvents, AnErrorOfAHandlerWhileAnUnknownTextChoosesTheDefaultLeavesTheTextUnstoredToo) {
+    stage.Put("Text", "red");
+    stage.Put("DefaultValue", 9);
+    stage.Reset();
+    stage.AtEvent([] { throw frame::ControlError(applicationError); });
+    EXPECT_EQ(ErrorOf([&] { stage.Put("Text", "Mauve"); }), applicationError);
+    EXPECT_EQ(stage.Happened(), "Click");
+    EXPECT_EQ(stage.Saved("Text"), Variant("red"));
+    EXPECT_EQ(stage.ListIndex(), 2);
+    EXPECT_EQ(stage.LabelText(), "Red");  // it follows behind the event
+    EXPECT_TRUE(stage.host.errors.reports.empty());
+}
+
+// Handlers that change the control, or fail.
+
+/// Where the error of a handler goes.
+enum class Fate { Reported, Thrown, Skipped };
 
 struct Input {
     const char* name;
     void (*send)(Stage&);
+    Fate errorIs = Fate::Reported;  // the user's input has no caller to take it
 };
 void PrintTo(const Input& input, std::ostream* out) { *out << input.name; }
 
@@ -148,9 +182,10 @@ class DataListHandlers : public testing::TestWithParam<Input> {
 
 INSTANTIATE_TEST_SUITE_P(Events, DataListHandlers,
                          testing::Values(Input{"Click", [](Stage& stage) { Fire(stage.List(0), "Click"); }},
-                                         Input{"Choice", [](Stage& stage) { stage.Choose(1); }},
-                                         Input{"SetValue", [](Stage& stage) { stage.Put("Value", 7); }},
-                                         Input{"SetText", [](Stage& stage) { stage.Put("Text", "blue"); }},
+                                         Input{"UserChoice", [](Stage& stage) { Fire(stage.List(0), "Click", {1}); }},
+                                         Input{"Choice", [](Stage& stage) { stage.Choose(1); }, Fate::Thrown},
+                                         Input{"SetValue", [](Stage& stage) { stage.Put("Value", 7); }, Fate::Skipped},
+                                         Input{"SetText", [](Stage& stage) { stage.Put("Text", "blue"); }, Fate::Thrown},
                                          Input{"DblClick", [](Stage& stage) { Fire(stage.List(0), "DblClick"); }},
                                          Input{"KeyDown",
                                                [](Stage& stage) {
@@ -187,6 +222,29 @@ TEST_P(DataListHandlers, ADestroyedControlRaisesNothingMore) {
     EXPECT_EQ(raised, "");
     EXPECT_EQ(stage.Happened(), "");
     EXPECT_TRUE(stage.host.errors.reports.empty());
+}
+
+TEST_P(DataListHandlers, AnErrorOfAHandlerIsReportedOnceOrGoesToTheCallerAndTheListGoesOnWorking) {
+    const Fate fate = GetParam().errorIs;
+    stage.AtEvent([] { throw frame::ControlError(applicationError, "The handler's own words"); });
+    EXPECT_EQ(ErrorOf([&] { Send(); }), fate == Fate::Thrown ? applicationError : 0);
+    EXPECT_FALSE(stage.onEvent);  // it has run
+    const auto& reports = stage.host.errors.reports;
+    ASSERT_EQ(reports.size(), fate == Fate::Reported ? 1u : 0u);
+    if (fate == Fate::Reported) {
+        EXPECT_EQ(reports[0].error.Number(), applicationError);
+        EXPECT_EQ(reports[0].error.Description(), "The handler's own words");
+    }
+    EXPECT_EQ(ErrorOf([&] { Send(); }), 0);
+    stage.Reset();
+    Fire(stage.List(0), "Click", {2});
+    Fire(stage.List(0), "KeyPress", {letterA});
+    EXPECT_EQ(stage.Happened(), "Click KeyPress(65)");
+    EXPECT_EQ(stage.Value(), 9);
+    EXPECT_EQ(stage.LabelText(), "Green");
+    EXPECT_EQ(stage.Add("Grey", 11), "");
+    EXPECT_EQ(stage.ItemsOf(0), "Red=5 | Blue=7 | Green=9 | Grey=11");
+    EXPECT_EQ(reports.size(), fate == Fate::Reported ? 1u : 0u);
 }
 
 TEST_P(DataListHandlers, AHandlerMayClearTheList) {

@@ -1,18 +1,24 @@
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cstdint>
 #include <memory>
 #include <ostream>
+#include <random>
 #include <string>
+#include <unordered_set>
+#include <utility>
 #include <vector>
 
+#include "hosts/headless/MemoryRecordset.h"
 #include "tests/controls/datalist/DataListTestHelp.h"
 
 /// Filling the list from a source of records.
 namespace tessel::controls {
 namespace {
 
+using headless::MemoryRecordset;
 using test::ErrorOf;
 using testing::ElementsAre;
 using namespace datalisttest;
@@ -273,6 +279,19 @@ TEST_F(DataListPopulate, ADefaultValueBeyond16BitsAddsTheDefaultItemWithTheOldVa
     }
 }
 
+// The value is taken to 16 bits only to be stored: what fails leaves the property as it is, and the item takes it whole.
+TEST_F(DataListPopulate, ADefaultTextAloneGoesWithADefaultValueBeyond16BitsWhole) {
+    for (const std::int32_t value : {32'768, 40'000, -40'000}) {
+        stage.Put("DefaultValue", value);
+        EXPECT_EQ(stage.PopulateWith(records, "Any"), "");
+        EXPECT_EQ(stage.ItemsOf(0), "Any=" + std::to_string(value) + " | Pear=1 | Apple=2 | Fig=3");
+        EXPECT_EQ(stage.ListIndex(), 0);
+        EXPECT_EQ(stage.Value(), value);
+        EXPECT_EQ(stage.Get("DefaultText"), Variant("Any"));
+        EXPECT_EQ(stage.Get("DefaultValue"), Variant(value));
+    }
+}
+
 TEST_F(DataListPopulate, ADefaultValueThatIsNoNumberAddsTheDefaultItemWithTheOldValue) {
     EXPECT_EQ(stage.PopulateWith(records, "Any", "no number"), "");
     EXPECT_EQ(stage.ItemsOf(0), "Any=77 | Pear=1 | Apple=2 | Fig=3");
@@ -491,6 +510,86 @@ TEST_F(DataListPopulate, ItemsAddedInsideAnAddedItemsTurnStandInTheOrderOfTheirC
     stage.AtYield([&] { stage.Add("Inner", 42); });
     EXPECT_EQ(stage.Add("Outer", 41), "");
     EXPECT_EQ(stage.ItemsOf(0), "Old=40 | Outer=41 | Inner=42");
+}
+
+// Many rows.
+
+using Pairs = std::vector<std::pair<std::string, std::int32_t>>;
+
+/// 100,000 rows with some 60,000 different values from -30,000 on, in no order. Each 100th text is blank.
+Pairs ManyPairs() {
+    constexpr std::uint32_t rows = 100'000, values = 60'000, blankEach = 100;
+    Pairs pairs;
+    pairs.reserve(rows);
+    std::mt19937 random(20);
+    for (std::uint32_t row = 0; row < rows; ++row) {
+        const auto drawn = static_cast<std::uint32_t>(random());
+        pairs.emplace_back(row % blankEach == 0 ? std::string() : std::to_string(drawn),
+                           static_cast<std::int32_t>(drawn % values) - 30'000);
+    }
+    return pairs;
+}
+
+/// What a list takes of them, one after the other: no blank text, the first of each value, under a number that stays at 32767.
+Pairs Taken(const Pairs& offered, bool numbered) {
+    constexpr int lastNumber = 32'767;
+    Pairs taken;
+    std::unordered_set<std::int32_t> present;
+    int number = 0;
+    for (const auto& [text, value] : offered) {
+        if (text.empty() || !present.insert(value).second) continue;
+        number = std::min(number + 1, lastNumber);
+        const std::string padded = "     " + std::to_string(number);
+        taken.emplace_back(numbered ? padded.substr(padded.size() - 4) + " - " + text : text, value);
+    }
+    return taken;
+}
+
+/// Fills a list from the pairs and compares all of its items.
+void ExpectItems(Stage& stage, int list, const Pairs& offered, const Pairs& expected) {
+    std::vector<MemoryRecordset::Row> rows;
+    rows.reserve(offered.size());
+    for (const auto& [text, value] : offered) {
+        MemoryRecordset::Row& row = rows.emplace_back();
+        row.reserve(2);
+        row.emplace_back(text);
+        row.emplace_back(value);
+    }
+    MemoryRecordset records("RS1", {"Name", "Id"}, std::move(rows));
+    EXPECT_EQ(Call(stage.Control(), "Populate", {frame::ObjectRef(records), "Name", "Id"}), Variant(""));
+    EXPECT_TRUE(records.AtEnd());
+    frame::Object& items = stage.List(list);
+    ASSERT_EQ(items.Get("ListCount"), Variant(static_cast<std::int32_t>(expected.size())));
+    const frame::Member *text = items.Table().Find("List"), *value = items.Table().Find("ItemData");
+    for (std::size_t i = 0; i < expected.size(); ++i) {
+        Variant at[] = {static_cast<std::int32_t>(i)};
+        const std::pair item(text->get(items, at).ToText(), value->get(items, at).ToLong());
+        if (item != expected[i]) FAIL() << i << ": " << item.first << "=" << item.second << " and not " << expected[i].first;
+    }
+}
+
+TEST(DataListOfManyRows, WithUniqueValuesTheFirstRowOfEachValueIsTakenBeyondTheLastNumberToo) {
+    constexpr std::size_t lastNumber = 32'767;
+    Stage stage;
+    stage.Put("OnlyUniqueValues", true);
+    stage.Put("Style", countAndText);
+    const Pairs offered = ManyPairs(), expected = Taken(offered, true);
+    ASSERT_GT(expected.size(), lastNumber);
+    ExpectItems(stage, 0, offered, expected);
+    const auto& [text, value] = expected.back();
+    EXPECT_EQ(stage.Add("Another", value), "Item with value " + std::to_string(value) + " already exists.");
+    stage.Put("Value", value);
+    EXPECT_EQ(stage.Text(), text);
+}
+
+TEST(DataListOfManyRows, WithUniqueValuesASortedListTakesTheSameRowsInTheirOrder) {
+    Stage stage;
+    stage.Put("OnlyUniqueValues", true);
+    stage.Put("Sorted", true);
+    const Pairs offered = ManyPairs();
+    Pairs expected = Taken(offered, false);
+    std::sort(expected.begin(), expected.end());
+    ExpectItems(stage, 1, offered, expected);
 }
 
 }  // namespace

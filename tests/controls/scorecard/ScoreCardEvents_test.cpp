@@ -256,6 +256,33 @@ TEST(ScoreCardForwarding, WhatAHandlerSetsInTheArgumentsIsNotReadBack) {
     }
 }
 
+TEST(ScoreCardForwarding, PlacesOfTheMouseAreInTwipsOfThePictureBoxThoughItDrawsInPixels) {
+    for (const int borderStyle : {0, 1}) {
+        Card card(GaugeBag({{"BorderStyle", borderStyle}}));
+        ASSERT_EQ(card.picture.ScaleMode(), frame::ScaleModeConstants::Pixels);
+        const float border = borderStyle != 0 ? frame::borderTwips : 0;
+        // As a screen reports them, from the corner of the box.
+        const auto [x, y] = card.picture.InputPoint(307.5f + border, 150 + border);
+        card.picture.MouseDownInput(1, 2, x, y);
+        EXPECT_EQ(LastArguments(card.host), "1 2 307.5 150") << borderStyle;
+        card.picture.MouseMoveInput(1, 0, x, y);
+        EXPECT_EQ(LastArguments(card.host), "1 0 307.5 150") << borderStyle;
+        card.picture.MouseUpInput(2, 1, x, y);
+        EXPECT_EQ(LastArguments(card.host), "2 1 307.5 150") << borderStyle;
+        EXPECT_EQ(card.host.log.EventNames("ScoreCard1"), "MouseDown MouseMove MouseUp");
+    }
+}
+
+TEST(ScoreCardForwarding, PlacesOfTheMouseStartAtTheInsideOfTheBorder) {
+    Card card(GaugeBag());
+    const auto [left, top] = card.picture.InputPoint(0, 0);
+    card.picture.MouseMoveInput(0, 0, left, top);
+    EXPECT_EQ(LastArguments(card.host), "0 0 -30 -30");
+    const auto [right, bottom] = card.picture.InputPoint(card.picture.Width(), card.picture.Height());
+    card.picture.MouseMoveInput(0, 0, right, bottom);
+    EXPECT_EQ(LastArguments(card.host), "0 0 1530 330") << "100 by 20 pixels and the border";
+}
+
 TEST(ScoreCardForwarding, EventsComeAtDesignTimeAndWhileDisabledAsTheyAreReported) {
     Card card(Options{.placedNew = true, .designTime = true});
     card.Put("Enabled", false);

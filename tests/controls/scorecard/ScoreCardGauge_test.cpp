@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include <cstdint>
+#include <set>
 #include <string>
 #include <tuple>
 #include <utility>
@@ -395,6 +396,21 @@ TEST(ScoreCardValueText, IsNotScaledToTheRange) {
 
 TEST(ScoreCardValueText, NoneOrAnotherNumberPrintsNothing) {
     for (const int value : {0, 7, -1}) EXPECT_THAT(Marks(RedrawnGauge({{"ShowValue", value}})), IsEmpty()) << value;
+    for (const double value : {0.75, 1.5, 2.5, 5.75, 6.25, -2.5})
+        EXPECT_THAT(Marks(RedrawnGauge({{"ShowValue", value}})), IsEmpty()) << value;
+}
+
+TEST(ScoreCardValueText, APlaceOfTheSameNumberInAnotherTypePrints) {
+    for (const Variant& value : {Variant(2.0), Variant(2.0f), Variant(2)})
+        EXPECT_THAT(Marks(RedrawnGauge({{"ShowValue", value}})), ElementsAre(PrintText("5000%", 35, 3.5f)));
+}
+
+TEST(ScoreCardValueText, ANumberBeyondAllPlacesPrintsNothingAndFailsNoLoad) {
+    for (const double value : {70'000.0, 1e10, -1e10, 1e300}) {
+        Lines marks = {"not drawn"};
+        EXPECT_EQ(ErrorOf([&] { marks = Marks(RedrawnGauge({{"ShowValue", value}})); }), 0) << value;
+        EXPECT_THAT(marks, IsEmpty()) << value;
+    }
 }
 
 TEST(ScoreCardValueText, IsPrintedInItsOwnColorAndTheForeColorComesBack) {
@@ -479,6 +495,114 @@ TEST(ScoreCardPen, OfAFlashCardIsTheOneOfTheGaugeBefore) {
     Card card(GaugeBag({{"ShowBlocks", 2}}));
     card.Put("Style", style::flashCard);
     EXPECT_THAT(card.Drawn(), ElementsAre("Cls", BoxText(0, 0, longSide, shortSide, yellow, 3)));
+}
+
+// What is seen of it.
+
+constexpr std::uint32_t fill = 0x123456, ground = 0xF0E0D0, outside = 0xFFFFFFFF;
+
+/// A gauge in colours that nothing else has.
+MemoryBag::Contents Colored(const MemoryBag::Contents& other) {
+    MemoryBag bag(GaugeBag({{"ForeColor", OLE_COLOR(fill)}, {"BackColor", OLE_COLOR(ground)}}));
+    for (const auto& [key, value] : other) bag.Set(key, value);
+    return bag.Kept();
+}
+Card Lying(const MemoryBag::Contents& other) { return Card(Colored(other)); }
+Card Standing(const MemoryBag::Contents& other) { return Card(Upright(Colored(other))); }
+
+using Colors = std::set<std::uint32_t>;
+std::uint32_t PixelOf(const Card& card, int x, int y) {
+    return static_cast<std::uint32_t>(card.picture.Point(static_cast<float>(x), static_cast<float>(y)));
+}
+/// The colours of a column of pixels from edge to edge.
+Colors ColumnAt(const Card& card, int x) {
+    Colors colors;
+    for (int y = 0; y < static_cast<int>(card.picture.ScaleHeight()); ++y) colors.insert(PixelOf(card, x, y));
+    return colors;
+}
+Colors RowAt(const Card& card, int y) {
+    Colors colors;
+    for (int x = 0; x < static_cast<int>(card.picture.ScaleWidth()); ++x) colors.insert(PixelOf(card, x, y));
+    return colors;
+}
+constexpr std::pair<int, std::uint32_t> limits[] = {{20, red}, {40, yellow}, {60, green}, {80, cyan}};
+
+TEST(ScoreCardPixels, LimitLinesAreNotBrokenByGaps) {
+    const Card card = Lying({{"Value", 100}, {"ShowBlocks", 5}, {"ShowLimitLines", true}});
+    for (const auto& [limit, color] : limits) {
+        const int x = frame::PixelAt(At(static_cast<float>(limit)));
+        EXPECT_EQ(ColumnAt(card, x), Colors{color}) << "from edge to edge at " << limit;
+        for (const int beside : {x - 1, x + 1}) EXPECT_EQ(ColumnAt(card, beside), Colors{ground}) << "the gap at " << limit;
+        for (const int beyond : {x - 2, x + 2}) EXPECT_EQ(ColumnAt(card, beyond), Colors{fill}) << "the block at " << limit;
+    }
+}
+
+TEST(ScoreCardPixels, LimitLinesOfAnUprightGaugeAreNotBrokenByGaps) {
+    const Card card = Standing({{"Value", 100}, {"ShowBlocks", 5}, {"ShowLimitLines", true}});
+    for (const auto& [limit, color] : limits) {
+        const int y = frame::PixelAt(longSide - At(static_cast<float>(limit)));
+        EXPECT_EQ(RowAt(card, y), Colors{color}) << "from edge to edge at " << limit;
+        for (const int beside : {y - 1, y + 1}) EXPECT_EQ(RowAt(card, beside), Colors{ground}) << "the gap at " << limit;
+        for (const int beyond : {y - 2, y + 2}) EXPECT_EQ(RowAt(card, beyond), Colors{fill}) << "the block at " << limit;
+    }
+}
+
+TEST(ScoreCardPixels, AFillBeyondTheEndIsCutOffByTheSurface) {
+    const Card card = Lying({{"Value", 150}});
+    for (int x = 0; x < 100; ++x) EXPECT_EQ(ColumnAt(card, x), Colors{fill}) << x;
+    EXPECT_EQ(ColumnAt(card, 100), Colors{outside});
+    const Card upright = Standing({{"Value", 150}});
+    for (int y = 0; y < 100; ++y) EXPECT_EQ(RowAt(upright, y), Colors{fill}) << y;
+    EXPECT_EQ(RowAt(upright, -1), Colors{outside});
+}
+
+TEST(ScoreCardPixels, AnOverrunBeyondTheEndIsCutOffByTheSurface) {
+    const Card card = Lying({{"Style", style::gaugeOverrun}, {"Value", 150}});
+    EXPECT_EQ(ColumnAt(card, 79), Colors{fill});
+    for (int x = 80; x < 100; ++x) EXPECT_EQ(ColumnAt(card, x), Colors{red}) << x;
+    EXPECT_EQ(ColumnAt(card, 100), Colors{outside});
+    const Card upright = Standing({{"Style", style::gaugeOverrun}, {"Value", 150}});
+    EXPECT_EQ(RowAt(upright, 21), Colors{fill});
+    for (int y = 0; y <= 20; ++y) EXPECT_EQ(RowAt(upright, y), Colors{red}) << y;
+}
+
+TEST(ScoreCardPixels, ABandOffTheLeftEdgeLeavesTheColumnOfItsStart) {
+    // A band is a box, and boxes include both corners: the one at the start is on the surface.
+    for (const int value : {-30, -1, 0}) {
+        const Card card = Lying({{"Value", value}});
+        EXPECT_EQ(ColumnAt(card, 0), Colors{fill}) << value;
+        for (int x = 1; x < 100; ++x) EXPECT_EQ(ColumnAt(card, x), Colors{ground}) << value << " " << x;
+    }
+}
+
+TEST(ScoreCardPixels, ABandBelowAnUprightGaugeIsNotSeen) {
+    // Its start is the row under the last one of the surface.
+    for (const int value : {-30, -1, 0}) {
+        const Card card = Standing({{"Value", value}});
+        for (int y = 0; y < 100; ++y) EXPECT_EQ(RowAt(card, y), Colors{ground}) << value << " " << y;
+    }
+}
+
+TEST(ScoreCardPixels, ARaisedBarOverTheLeftEdgeShowsTheLinesThatLieInside) {
+    const Card card = Lying({{"Value", -1}, {"ShowMarker", 2}});
+    EXPECT_EQ(ColumnAt(card, 0), Colors{gray}) << "over the column of the band";
+    EXPECT_EQ(ColumnAt(card, 1), Colors{black});
+    for (int x = 2; x < 100; ++x) EXPECT_EQ(ColumnAt(card, x), Colors{ground}) << x;
+}
+
+TEST(ScoreCardPixels, AMarkerOffTheLeftEdgeIsNotSeen) {
+    for (const int marker : {1, 2, 3}) {
+        const Card card = Lying({{"Value", -30}, {"ShowMarker", marker}});
+        EXPECT_EQ(ColumnAt(card, 0), Colors{fill}) << marker;
+        for (int x = 1; x < 100; ++x) EXPECT_EQ(ColumnAt(card, x), Colors{ground}) << marker << " " << x;
+    }
+}
+
+TEST(ScoreCardPixels, ARaisedBarOverTheRightEdgeShowsTheLinesThatLieInside) {
+    const Card card = Lying({{"Value", 100}, {"ShowMarker", 2}});
+    EXPECT_EQ(ColumnAt(card, 97), Colors{fill});
+    EXPECT_EQ(ColumnAt(card, 98), Colors{white});
+    EXPECT_EQ(ColumnAt(card, 99), Colors{silver});
 }
 
 // Each property shows at once.

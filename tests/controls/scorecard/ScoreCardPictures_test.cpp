@@ -282,6 +282,27 @@ TEST(ScoreCardPictures, ThresholdsChooseThePicture) {
     EXPECT_EQ(card.ShownImage(), "ImageList16 ScoreCard5");
 }
 
+TEST(ScoreCardPictures, AValueAtAThresholdTakesTheHigherGrade) {
+    const std::pair<double, int> thresholds[] = {{0.2, 2}, {0.4, 3}, {0.6, 4}, {0.8, 5}};
+    for (const auto& [value, grade] : thresholds) {
+        const std::string image = "ImageList32 Smiley" + std::to_string(grade);
+        Card set({{"Style", style::smileyLarge}});
+        set.Put("Value", value);
+        EXPECT_EQ(set.ShownImage(), image) << value << " by a set";
+        Card loaded({{"Style", style::smileyLarge}, {"Value", value}});
+        EXPECT_EQ(loaded.ShownImage(), image) << value << " by a load";
+        Card saved({{"Style", style::smileyLarge}, {"Value", static_cast<float>(value)}});
+        EXPECT_EQ(saved.ShownImage(), image) << value << " by a load of what was set";
+    }
+}
+
+TEST(ScoreCardPictures, AThresholdSetToTheValueTakesTheHigherGrade) {
+    Card card({{"Value", 0.7}});
+    EXPECT_EQ(card.ShownImage(), "ImageList16 ScoreCard4");
+    card.Put("ScoreStar", 0.7);
+    EXPECT_EQ(card.ShownImage(), "ImageList16 ScoreCard5");
+}
+
 TEST(ScoreCardPictures, EachThresholdIsTestedOnItsOwnAndALaterOneWins) {
     // A saved state may have its thresholds in any order.
     Card star({{"Value", 0.1}, {"ScoreStar", 0.0}});
@@ -323,6 +344,19 @@ TEST(ScoreCardFlashCard, IsABoxInTheColorOfTheValue) {
     for (const auto& [value, color] : colors) {
         card.Put("Value", value);
         EXPECT_THAT(card.Drawn(), ElementsAre("Cls", BoxText(0, 0, longSide, shortSide, color))) << value;
+    }
+}
+
+TEST(ScoreCardFlashCard, AValueAtAThresholdTakesTheHigherGrade) {
+    const std::pair<double, std::uint32_t> thresholds[] = {{0.2, red}, {0.4, yellow}, {0.6, green}, {0.8, cyan}};
+    for (const auto& [value, color] : thresholds) {
+        Card set({{"Style", style::flashCard}});
+        set.Put("Value", value);
+        EXPECT_EQ(set.picture.Point(50, 10), static_cast<std::int32_t>(color)) << value << " by a set";
+        Card loaded({{"Style", style::flashCard}, {"Value", value}});
+        EXPECT_EQ(loaded.picture.Point(50, 10), static_cast<std::int32_t>(color)) << value << " by a load";
+        Card saved({{"Style", style::flashCard}, {"Value", static_cast<float>(value)}});
+        EXPECT_EQ(saved.picture.Point(50, 10), static_cast<std::int32_t>(color)) << value << " by a load of what was set";
     }
 }
 

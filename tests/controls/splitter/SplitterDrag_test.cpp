@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "tests/HostUnderTest.h"
@@ -482,6 +483,77 @@ TEST(SplitterOnItsHost, ALoadedBarKeepsItsLimits) {
     EXPECT_EQ(site.Top(), 600);
     DragBy(bar, 0, 1e6f);
     EXPECT_EQ(site.Top(), Inner(host, "ScaleHeight") - 800 - thick);
+}
+
+TEST(SplitterOnItsHost, WhenBothLimitsExceedItsFormTheBottomRightOneWins) {
+    for (const int orientation : {horizontal, vertical}) {
+        HostUnderTest host;
+        auto& bar = host.Create(SplitterClass(), "Splitter1");
+        bar.Put("Orientation", orientation);
+        const bool across = orientation == horizontal;
+        const float form = Inner(host, across ? "ScaleHeight" : "ScaleWidth");
+        bar.Put("MinTopLeft", form * 0.75f);
+        bar.Put("MinBottomRight", form * 0.5f);
+        auto& site = *host.SiteOf(bar);
+        site.SetPlace(across ? 0 : 1000.0f, across ? 1000.0f : 0);
+        host.log.Clear();
+        for (const float distance : {10.0f, form, -form}) DragBy(bar, across ? 0 : distance, across ? distance : 0);
+        EXPECT_EQ(across ? site.Top() : site.Left(), form - form * 0.5f - thick);
+        EXPECT_EQ(across ? site.Left() : site.Top(), 0);
+        EXPECT_EQ(host.log.EventNames("Splitter1"),
+                  "MouseDown MouseMove AfterMove MouseUp MouseDown MouseMove MouseUp MouseDown MouseMove MouseUp");
+    }
+}
+
+/// A bar at 1000 above another bar, which is 3000 wide and 900 high and stands at 2000.
+class TwoBars {
+  public:
+    TwoBars() {
+        bar.Put("ControlsTopLeft", "Splitter2");
+        bar.Put("ControlsBottomRight", "Splitter2");
+        site.SetPlace(0, 1000);
+        site.SetSize(3000, thick);
+        other.SetPlace(0, 2000);
+        other.SetSize(3000, 900);
+        host.log.Clear();
+    }
+    bool OtherIsUntouched() const {
+        return other.Left() == 0 && other.Top() == 2000 && other.Width() == 3000 && other.Height() == 900;
+    }
+
+    HostUnderTest host;
+    frame::Control& bar = host.Create(SplitterClass(), "Splitter1");
+    test::SiteUnderTest& site = *host.SiteOf(bar);
+    test::SiteUnderTest& other = *host.SiteOf(host.Create(SplitterClass(), "Splitter2"));
+};
+
+TEST(SplitterOnItsHost, AMoveThatItsLimitsReduceToNothingMovesNoControlAndRaisesNoAfterMove) {
+    TwoBars bars;
+    bars.bar.Put("MinTopLeft", 1000);
+    bars.bar.Put("MinBottomRight", 800);
+    const float lowest = Inner(bars.host, "ScaleHeight") - 800 - thick;
+    const std::pair<float, float> moves[] = {{1000, -200}, {lowest, 200}};
+    for (const auto& [top, distance] : moves) {
+        bars.site.SetPlace(0, top);
+        bars.host.log.Clear();
+        DragBy(bars.bar, 0, distance);
+        EXPECT_EQ(bars.site.Top(), top);
+        EXPECT_TRUE(bars.OtherIsUntouched()) << top;
+        EXPECT_EQ(bars.host.log.EventNames("Splitter1"), "MouseDown MouseMove MouseUp");
+    }
+}
+
+TEST(SplitterOnItsHost, ListsWithoutANameLetTheBarMoveAlone) {
+    for (const char* list : {"", ",", " , ,"}) {
+        TwoBars bars;
+        bars.bar.Put("ControlsTopLeft", list);
+        bars.bar.Put("ControlsBottomRight", list);
+        DragBy(bars.bar, 0, 100);
+        EXPECT_EQ(bars.site.Top(), 1100);
+        EXPECT_TRUE(bars.OtherIsUntouched()) << '"' << list << '"';
+        EXPECT_EQ(bars.host.log.EventNames("Splitter1"), "MouseDown MouseMove AfterMove MouseUp");
+        EXPECT_THAT(bars.host.errors.reports, IsEmpty());
+    }
 }
 
 }  // namespace

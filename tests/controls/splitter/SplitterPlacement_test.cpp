@@ -50,6 +50,28 @@ TEST(SplitterPlacement, ABarTurnedUprightStandsInTheMiddleOfItsForm) {
     EXPECT_EQ(bar.Get("MousePointer"), Variant(9));
 }
 
+TEST(SplitterPlacement, ABarTurnedAtRunTimeGoesToTheMiddleOfItsFormWithoutAfterMove) {
+    HostUnderTest host;
+    auto& other = *host.SiteOf(host.Create(SplitterClass(), "Splitter2", {.width = 500, .height = 300}));
+    auto& bar = host.Create(SplitterClass(), "Splitter1", {.width = 500, .height = 300});
+    bar.Put("ControlsTopLeft", "Splitter2");
+    bar.Put("ControlsBottomRight", "Splitter2");
+    other.SetPlace(40, 50);
+    host.log.Clear();
+    const float formWidth = Inner(host, "ScaleWidth"), formHeight = Inner(host, "ScaleHeight");
+    bar.Put("Orientation", vertical);
+    EXPECT_EQ(PlaceOf(*host.SiteOf(bar)), PlaceText(formWidth / 2, 0, thick, formHeight));
+    EXPECT_EQ(bar.Get("MousePointer"), Variant(9));
+    bar.Put("Orientation", horizontal);
+    EXPECT_EQ(PlaceOf(*host.SiteOf(bar)), PlaceText(0, formHeight / 2, formWidth, thick));
+    EXPECT_EQ(bar.Get("MousePointer"), Variant(7));
+    EXPECT_EQ(PlaceOf(other), PlaceText(40, 50, 500, 300));
+    EXPECT_EQ(host.log.EventNames(), "");
+    DragBy(bar, 0, 100);
+    EXPECT_EQ(host.log.EventNames("Splitter1"), "MouseDown MouseMove AfterMove MouseUp");
+    EXPECT_EQ(PlaceOf(other), PlaceText(40, 150, 500, 300));
+}
+
 TEST(SplitterPlacement, ANewBarAtRunTimeStaysWhereItIs) {
     HostUnderTest host;
     auto& bar = host.Create(SplitterClass(), "Splitter1", {.width = 500, .height = 300});

@@ -22,6 +22,7 @@ using frame::Variant;
 using test::HostUnderTest;
 using testing::ElementsAre;
 using testing::EndsWith;
+using testing::HasSubstr;
 using testing::IsEmpty;
 using namespace splittertest;
 
@@ -417,6 +418,36 @@ TEST_P(SplitterUnderHandler, HandlerThatDestroysTheOtherBarHolds) {
     EXPECT_NE(host.FindSite("Splitter1"), nullptr);
     EXPECT_EQ(host.FindSite("Splitter2"), nullptr);
     EXPECT_THAT(host.errors.reports, IsEmpty());
+}
+
+// The drag step runs in resume-next mode to its end, so that what fails in AfterMove is skipped.
+TEST_P(SplitterUnderHandler, HandlerThatFailsIsReportedOnceOrSkippedInTheStepAndTheBarGoesOnWorking) {
+    const std::string event = GetParam().name;
+    const bool inTheStep = event == "AfterMove";
+    auto& site = *host.SiteOf(bar);
+    auto& otherSite = *host.SiteOf(other);
+    handler = [] { throw ControlError(1234, "The handler's own words"); };
+    GetParam().send(bar);
+    EXPECT_FALSE(handler);  // it has run
+    EXPECT_EQ(site.Top(), inTheStep ? 1100 : 1000);
+    const auto& reports = host.errors.reports;
+    ASSERT_EQ(reports.size(), inTheStep ? 0u : 1u);
+    if (!inTheStep) {
+        EXPECT_EQ(reports[0].error.Number(), 1234);
+        EXPECT_EQ(reports[0].error.Description(), "The handler's own words");
+        EXPECT_EQ(reports[0].where, "Splitter1." + event);
+    }
+    host.log.Clear();
+    GetParam().send(bar);
+    EXPECT_THAT(host.log.EventNames("Splitter1"), HasSubstr(event));
+    const float top = site.Top(), otherTop = otherSite.Top();
+    host.log.Clear();
+    DragBy(bar, 0, 100);
+    MoveTo(bar, 50, 500);
+    EXPECT_EQ(host.log.EventNames("Splitter1"), "MouseDown MouseMove AfterMove MouseUp MouseMove");
+    EXPECT_EQ(site.Top(), top + 100);
+    EXPECT_EQ(otherSite.Top(), otherTop + 100);
+    EXPECT_EQ(reports.size(), inTheStep ? 0u : 1u);
 }
 
 TEST_P(SplitterUnderHandler, HandlerMaySetEveryProperty) {

@@ -94,6 +94,21 @@ TEST_F(SplitterTest, AnEventMadeBeforeTheBarMovedCountsByThePointersPlaceOnTheSc
     Release(window, {134, 150});
 }
 
+TEST_F(SplitterTest, AReleaseThatAnotherWindowHadEndsTheDrag) {
+    Show();
+    Press(window, {104, 150});
+    DragTo({124, 150});
+    EXPECT_EQ(bar->x(), 120);
+    QObject::connect(bar, &Splitter::mouseUp, bar, [this](short& button) { heard.push_back("MouseUp " + std::to_string(button)); });
+    heard.clear();
+    // The button is held no more when the pointer comes back.
+    QMouseEvent back(QEvent::MouseMove, QPointF(34, 150), QPointF(34, 150), window->mapToGlobal(QPointF(154, 150)), Qt::NoButton,
+                     Qt::NoButton, {});
+    QCoreApplication::sendEvent(Surface(), &back);
+    EXPECT_EQ(bar->x(), 120);
+    EXPECT_EQ(Events(), "MouseUp 1");
+}
+
 TEST_F(SplitterTest, ABarBetweenPixelsDoesNotTremble) {
     Show();
     bar->extender().Put("Left", 1506.5f);  // 100.43 pixels

@@ -166,6 +166,68 @@ TEST_P(SqlRecordsetTest, RunsAPreparedQueryWithItsValuesAgain) {
     EXPECT_EQ(Walk(records, "id"), "3,4,");
 }
 
+TEST_P(SqlRecordsetTest, AQueryExecutedAgainShowsItsNewColumnsFromTheNextMoveFirst) {
+    for (const bool forwardOnly : {false, true}) {
+        QSqlQuery query(database);
+        query.setForwardOnly(forwardOnly);
+        ASSERT_TRUE(query.exec(all));
+        SqlRecordset records(query);
+        records.MoveFirst();
+        EXPECT_EQ(records.FieldCount(), 3);
+        EXPECT_EQ(records.FieldName(0), "id");
+        ASSERT_TRUE(query.exec("SELECT share AS part, name FROM colours WHERE share IS NOT NULL ORDER BY id DESC"));
+        records.MoveFirst();
+        EXPECT_EQ(records.FieldCount(), 2) << forwardOnly;
+        EXPECT_EQ(records.FieldName(0), "part");
+        EXPECT_EQ(ErrorOf([&] { records.NumberOf("id"); }), frame::errors::noSuchField);
+        EXPECT_EQ(records.Fields("name")->Value().ToText(), "Blue");
+        EXPECT_EQ(Walk(records), "Blue,Red,,");
+        EXPECT_EQ(Walk(records, "part"), "3,0.5,2,");
+    }
+}
+
+TEST_P(SqlRecordsetTest, AQueryThatGivesNoRowsIsNotExecutedASecondTime) {
+    const auto pinks = [&] {
+        QSqlQuery query("SELECT COUNT(*) FROM colours WHERE name = 'Pink'", database);
+        return query.next() ? query.value(0).toInt() : -1;
+    };
+    int inserted = 0;
+    for (const bool forwardOnly : {false, true}) {
+        for (const bool prepared : {false, true}) {
+            QSqlQuery query(database);
+            query.setForwardOnly(forwardOnly);
+            if (prepared) {
+                query.prepare("INSERT INTO colours VALUES (?, 'Pink', 1)");
+                query.addBindValue(5);
+                ASSERT_TRUE(query.exec());
+            } else {
+                ASSERT_TRUE(query.exec("INSERT INTO colours VALUES (5, 'Pink', 1)"));
+            }
+            ASSERT_EQ(pinks(), ++inserted);
+            SqlRecordset records(query);
+            for (int i = 0; i < 2; ++i) EXPECT_EQ(ErrorOf([&] { records.MoveFirst(); }), frame::errors::noCurrentRow);
+            DataList list;
+            EXPECT_EQ(list.populate(query, 1, 0), ToQt(frame::ErrorText(frame::errors::noCurrentRow)));
+            EXPECT_EQ(list.listCount(), 0);
+            ASSERT_EQ(pinks(), inserted) << (forwardOnly ? "forward only" : "both ways") << (prepared ? ", prepared" : "");
+        }
+    }
+}
+
+TEST_P(SqlRecordsetTest, AfterAMoveToTheFirstOfNoRowsItStandsAtItsEndWhateverTheQueryIs) {
+    for (const char* sql : {"SELECT name FROM colours WHERE id > 100", "INSERT INTO colours VALUES (5, 'Pink', 1)"}) {
+        QSqlQuery query(all, database);
+        SqlRecordset records(query);
+        records.MoveFirst();
+        EXPECT_FALSE(records.AtEnd());
+        ASSERT_TRUE(query.exec(sql));
+        EXPECT_EQ(ErrorOf([&] { records.MoveFirst(); }), frame::errors::noCurrentRow);
+        EXPECT_TRUE(records.AtEnd()) << sql;
+        EXPECT_EQ(ErrorOf([&] { records.FieldValue(0); }), frame::errors::noCurrentRow);
+        EXPECT_EQ(ErrorOf([&] { records.MoveNext(); }), frame::errors::noCurrentRow) << sql;
+    }
+}
+
 TEST_P(SqlRecordsetTest, TakesATableByItsName) {
     Do("DROP TABLE IF EXISTS \"two words\"");
     Do("CREATE TABLE \"two words\" (a INTEGER)");

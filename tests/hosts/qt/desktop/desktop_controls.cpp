@@ -74,7 +74,16 @@ class Window final : public QWidget {
         };
         connect(card_, &ScoreCard::mouseDown, this, mouse("MouseDown"));
         connect(card_, &ScoreCard::mouseUp, this, mouse("MouseUp"));
+        connect(card_, &ScoreCard::mouseMove, this,
+                [this](short& button, short&, float& x, float& y) { moved_ = QString("%1 %2 %3").arg(button).arg(x).arg(y); });
         connect(card_, &ScoreCard::click, this, [] { Say("card Click"); });
+        connect(card_, &ScoreCard::dblClick, this, [] { Say("card DblClick"); });
+        card_->setFocusPolicy(Qt::StrongFocus);
+        connect(card_, &ScoreCard::keyDown, this,
+                [](short& key, short& shift) { Say(QString("card KeyDown %1 %2").arg(key).arg(shift)); });
+        connect(card_, &ScoreCard::keyPress, this, [](short& ascii) { Say(QString("card KeyPress %1").arg(ascii)); });
+        connect(card_, &ScoreCard::keyUp, this,
+                [](short& key, short& shift) { Say(QString("card KeyUp %1 %2").arg(key).arg(shift)); });
     }
 
     void makeList() {
@@ -90,6 +99,7 @@ class Window final : public QWidget {
         if (verb == "place") return placeOf(*findChild<QWidget*>(rest));
         if (verb == "focus") return nameOfFocus();
         if (verb == "tip") return QToolTip::isVisible() ? QToolTip::text() : QString();
+        if (verb == "moved") return moved_;
         if (verb == "popup") return QApplication::activePopupWidget() ? "open" : "none";
         if (verb == "text") return list_->text();
         if (verb == "shown") return shown();
@@ -135,6 +145,7 @@ class Window final : public QWidget {
     Splitter* bar_;
     ScoreCard* card_;
     DataList* list_ = nullptr;
+    QString moved_;  // what the card heard of the pointer last
 };
 
 }  // namespace

@@ -145,9 +145,34 @@ class DesktopControls(unittest.TestCase):
     def test_click_on_a_score(self):
         self.move_into("card", 50, 20)
         self.tool("click", 1)
-        border = 2  # the picture box counts from within it
-        x, y = 50 - border, 20 - border
+        x, y = self.inside_card(50, 20)
         self.wait_for_said(f"card MouseDown 1 0 {x} {y}", f"card MouseUp 1 0 {x} {y}", "card Click")
+
+    def inside_card(self, x, y):
+        """A place in twips, which the picture box counts from within its border."""
+        border, twips_per_pixel = 2, 15
+        return (x - border) * twips_per_pixel, (y - border) * twips_per_pixel
+
+    def test_double_click_on_a_score(self):
+        self.move_into("card", 50, 20)
+        self.tool("click", "--repeat", 2, "--delay", 20, 1)
+        x, y = self.inside_card(50, 20)
+        self.wait_for_said(f"card MouseDown 1 0 {x} {y}", f"card MouseUp 1 0 {x} {y}", "card Click", "card DblClick",
+                           f"card MouseUp 1 0 {x} {y}")
+
+    def test_pointer_over_a_score(self):
+        self.move_into("card", 70, 10)
+        self.move_into("card", 71, 12)
+        x, y = self.inside_card(71, 12)
+        self.wait_for_answer("moved", f"0 {x} {y}")
+
+    def test_keys_on_a_score(self):
+        self.move_into("card", 50, 20)
+        self.tool("click", 1)
+        self.wait_for_answer("focus", "card")
+        self.said.clear()
+        self.tool("key", "k")
+        self.wait_for_said("card KeyDown 75 0", "card KeyPress 107", "card KeyUp 75 0")
 
     def test_pointer_that_rests_on_a_score_shows_its_tip(self):
         self.move_into("card", 60, 20)
