@@ -25,9 +25,7 @@ void PictureBox::SetBorderStyle(std::int16_t value) {
     if (Store(borderStyle_, value)) Resized();
 }
 
-std::pair<float, float> PictureBox::InputPoint(float x, float y) const {
-    return {x - Border() / 2, y - Border() / 2};
-}
+std::pair<float, float> PictureBox::InputPoint(float x, float y) const { return {x - Border() / 2, y - Border() / 2}; }
 
 frame::TextSize PictureBox::InnerSize() const {
     return {Width() > Border() ? Width() - Border() : 0, Height() > Border() ? Height() - Border() : 0};

@@ -19,7 +19,7 @@ Variant FromSql(const QVariant& value) {
         case QMetaType::QString:
             return FromQt(value.toString());
         case QMetaType::LongLong:
-            return Variant::FromCount(value.toLongLong());
+            return Variant::FromCount(*static_cast<const qlonglong*>(value.constData()));
         default:
             return FromQt(value);
     }
@@ -74,10 +74,11 @@ void SqlRecordset::FieldText(std::int32_t field, std::string& text) {
     constexpr ushort firstBeyondAscii = 0x80;
     WantRow();
     const QVariant value = query_.value(field);
-    if (value.typeId() != QMetaType::QString || value.isNull()) {
+    if (value.typeId() != QMetaType::QString) {
         text = FromSql(value).ToText();
         return;
     }
+    // `NULL` has no characters.
     const auto& wide = *static_cast<const QString*>(value.constData());
     text.resize(static_cast<std::size_t>(wide.size()));
     const ushort* const from = wide.utf16();

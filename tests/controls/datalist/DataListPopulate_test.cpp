@@ -563,7 +563,8 @@ void ExpectItems(Stage& stage, int list, const Pairs& offered, const Pairs& expe
     const frame::Member *text = items.Table().Find("List"), *value = items.Table().Find("ItemData");
     for (std::size_t i = 0; i < expected.size(); ++i) {
         Variant at[] = {static_cast<std::int32_t>(i)};
-        const std::pair item(text->get(items, at).ToText(), value->get(items, at).ToLong());
+        const frame::Arguments index(at);
+        const std::pair item(text->get(items, index).ToText(), value->get(items, index).ToLong());
         if (item != expected[i]) FAIL() << i << ": " << item.first << "=" << item.second << " and not " << expected[i].first;
     }
 }
