@@ -80,6 +80,12 @@ struct DrawMode {
 using DrawOp = std::variant<draw::Cls, draw::Line, draw::Circle, draw::PSet, draw::Print, draw::PaintPicture, draw::DrawWidth,
                             draw::DrawStyle, draw::DrawMode>;
 
+/// Whether an operation draws nothing: it tells of another pen.
+inline bool IsPenChange(const DrawOp& op) {
+    return std::holds_alternative<draw::DrawWidth>(op) || std::holds_alternative<draw::DrawStyle>(op) ||
+           std::holds_alternative<draw::DrawMode>(op);
+}
+
 /// The pen with which an operation is drawn. The width is in pixels, whatever the surface's scale.
 struct Pen {
     int width = 1;

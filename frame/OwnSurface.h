@@ -36,7 +36,7 @@ class OwnSurface final : public DrawingSurface, public KeyTarget {
     void Refresh();
 
     frame::Host& InputHost() const override { return SurfaceHost(); }
-    TextSize InputExtent() const override { return InnerSize(); }
+    TextSize InputExtent() const override { return {Width(), Height()}; }
     /// From the inside of the border, in the surface's own scale.
     std::pair<float, float> InputPoint(float x, float y) const override;
 

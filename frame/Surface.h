@@ -97,8 +97,8 @@ class DrawingSurface {
     /// Those behind the system colours that it is drawn in.
     const SystemColors& Colors() const { return host_.Colors(); }
 
-    /// A canvas that gets every operation from now on, after it has been told the size and the background. It must be there for as
-    /// long as something is drawn.
+    /// A canvas that gets every operation from now on, after it has been told the size and the background. It must be there until
+    /// it is removed.
     void AddCanvas(Canvas& canvas);
     void RemoveCanvas(Canvas& canvas) { std::erase(canvases_, &canvas); }
     /// The same for a canvas that lives as long as the surface; null is none.

@@ -7,6 +7,7 @@
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QPlainTextEdit>
+#include <QSqlError>
 #include <QSqlQuery>
 #include <QVBoxLayout>
 
@@ -145,7 +146,8 @@ void ListsPage::fillSubdivisions() {
     query.prepare(country == 0 ? "SELECT id, name FROM subdivisions" : "SELECT id, name FROM subdivisions WHERE country = ?");
     if (country != 0) query.addBindValue(country);
     if (!subdivisions_.list->populate(query, "name", "id", defaultText(), 0).isEmpty()) {
-        // A country without any.
+        // A country without any, or the database's own words.
+        if (query.lastError().isValid()) say(query.lastError().text());
         subdivisions_.list->clear();
         if (defaults_->isChecked()) subdivisions_.list->addItem(defaultText(), 0);
         subdivisions_.list->setValue(0);

@@ -305,7 +305,7 @@ std::string DataList::AddEntry(const Variant& text, const Variant& value) {
     return AddText(next.Value([&] { return text.ToText(); }, {}), value);  // a test that fails refuses too
 }
 
-/// When the counter is full the counting alone fails: the item is added, under its last number.
+/// A counter that is full stays so: the item is added, under its last number.
 std::string DataList::AddText(std::string_view text, const Variant& value) {
     if (text.empty()) return "Blank text item not allowed.";
     ResumeNext next;

@@ -34,9 +34,9 @@ struct RowRange {
     RowOrder::Position count = 0;
 };
 
-/// The rows of a list: their order, texts and states, made for 100,000 of them. A row takes about 26 bytes besides the texts that
-/// were set by themselves, and 11 more once a row was looked for by its text. Positions count from 0; a `RowId` must name a row
-/// that is in the list.
+/// The rows of a list: their order, texts and states, made for 100,000 of them. A row takes about 18 bytes besides the texts that
+/// were set by themselves, 8 more once they are in another order, and 11 more once a row was looked for by its text. Positions
+/// count from 0; a `RowId` must name a row that is in the list.
 ///
 /// Sorting: by the texts of one column, without regard to case, rows with equal texts keep their order. The rows settle by the
 /// texts then standing when one is added, when one of the three sort settings is set, and in `TakeChanges`; setting a text moves

@@ -9,7 +9,8 @@
 namespace tessel::child {
 
 void RowOrder::Append(RowId row) {
-    if (plain_ && row == size_) {
+    if (plain_ && size_ == 0) first_ = row;
+    if (plain_ && row == first_ + size_) {
         ++size_;
     } else {
         Spread();
@@ -20,7 +21,8 @@ void RowOrder::Append(RowId row) {
 /// From here on the ids stand in chunks.
 void RowOrder::Spread() {
     if (!std::exchange(plain_, false)) return;
-    for (RowId row = 0, end = std::exchange(size_, 0); row < end; ++row) AppendToChunks(row);
+    const RowId end = first_ + std::exchange(size_, 0);
+    for (RowId row = first_; row < end; ++row) AppendToChunks(row);
 }
 
 void RowOrder::AppendToChunks(RowId row) {
@@ -48,7 +50,7 @@ void RowOrder::Insert(Position position, RowId row) {
 }
 
 RowId RowOrder::Remove(Position position) {
-    if (plain_ && position + 1 == size_) return --size_;
+    if (plain_ && position + 1 == size_) return first_ + --size_;
     Spread();
     const Place place = Find(position);
     auto& rows = ChunkAt(place.ordinal).rows;
@@ -64,13 +66,13 @@ RowId RowOrder::Remove(Position position) {
 void RowOrder::Clear() { *this = RowOrder(); }
 
 RowId RowOrder::At(Position position) const {
-    if (plain_) return position;
+    if (plain_) return first_ + position;
     const Place place = Find(position);
     return ChunkAt(place.ordinal).rows[place.offset];
 }
 
 RowOrder::Position RowOrder::PositionOf(RowId row) const {
-    if (plain_) return row;
+    if (plain_) return row - first_;
     const Chunk& chunk = chunks_[chunkOf_[row]];
     if (chunk.rows.back() == row && chunk.ordinal == LastOrdinal()) return size_ - 1;
     const auto found = std::find(chunk.rows.begin(), chunk.rows.end(), row);
@@ -81,7 +83,7 @@ RowOrder::Position RowOrder::PositionOf(RowId row) const {
 std::vector<RowId> RowOrder::All() const {
     std::vector<RowId> all(plain_ ? size_ : 0);
     if (plain_) {
-        std::iota(all.begin(), all.end(), RowId{0});
+        std::iota(all.begin(), all.end(), first_);
         return all;
     }
     all.reserve(size_);

@@ -12,9 +12,9 @@ namespace tessel::child {
 /// The order of the rows of a list: a sequence of row ids, each at most once, with positions from 0. Inserting, removing and
 /// both ways of looking up stay cheap with hundreds of thousands of rows; appending is the cheapest.
 ///
-/// As long as the ids are 0, 1, 2 and so on, as in a list that was filled and left so, nothing is kept but how many there are.
-/// After that they stand in chunks whose counts are summed in a binary indexed tree, so that a position is found through the tree
-/// and the position of an id through its chunk: about 8 bytes an id.
+/// As long as each id is the next after the one before it, as in a list that was filled and left so, nothing is kept but the
+/// first one and how many there are. After that they stand in chunks whose counts are summed in a binary indexed tree, so that a
+/// position is found through the tree and the position of an id through its chunk: about 8 bytes an id.
 class RowOrder {
   public:
     using Position = std::uint32_t;
@@ -69,7 +69,8 @@ class RowOrder {
     Position Before(std::uint32_t ordinal) const;
     void RebuildCounts();
 
-    bool plain_ = true;  // each id is its position, and there are no chunks
+    bool plain_ = true;  // the ids follow one another from `first_` on, and there are no chunks
+    RowId first_ = 0;
     std::vector<Chunk> chunks_;
     std::vector<ChunkId> spare_;
     std::vector<ChunkId> sequence_;  // the chunks in their order

@@ -147,6 +147,7 @@ class HeadlessHost::LoggingCanvas final : public frame::Canvas {
     void Draw(const frame::DrawOp& op, const frame::Pen& pen, const frame::Scale& scale, frame::OLE_COLOR background,
               frame::OLE_COLOR foreground) override {
         std::visit([this](const auto& operation) { log_.Add(EntryOf(operation)); }, op);
+        if (frame::IsPenChange(op)) return;  // each operation brings its pen
         Plane().Draw(op, pen, scale, background, foreground);
     }
     void Wipe(frame::OLE_COLOR background, const frame::PictureRef& picture) override {

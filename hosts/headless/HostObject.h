@@ -63,6 +63,7 @@ class SurfaceObject : public HostObject, public frame::DrawingSurface {
 
   protected:
     frame::TextSize InnerSize() const override { return inner_; }
+
   private:
     void SetInner(frame::TextSize size);
 

@@ -48,6 +48,7 @@ class ListWidget final : public RowView {
 
     void PressAt(const QMouseEvent& event) override;
     void ReleaseAt(const QMouseEvent& event) override;
+    void LosePress() override;
     void DragTo(bool isFar) override;
     void Hover(QPoint at) override;
     bool SensesRows() const override { return list_->HotTracking() || list_->HoverSelection(); }

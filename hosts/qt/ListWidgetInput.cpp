@@ -79,10 +79,15 @@ void ListWidget::DragTo(bool isFar) {
 
 void ListWidget::ReleaseAt(const QMouseEvent& event) {
     const auto row = HitRow(event.position().toPoint());
-    const auto waiting = std::exchange(pressedSelected_, std::nullopt);
+    const auto waiting = pressedSelected_;
+    LosePress();
+    if (waiting && waiting == row) list_->ItemClickInput(IndexOf(*row), ShiftOf(pressedWith_));
+}
+
+void ListWidget::LosePress() {
+    pressedSelected_.reset();
     EndBand();
     pressedBeside_.reset();
-    if (waiting && waiting == row) list_->ItemClickInput(IndexOf(*row), ShiftOf(pressedWith_));
 }
 
 void ListWidget::Hover(QPoint at) {

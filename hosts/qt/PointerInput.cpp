@@ -27,8 +27,9 @@ void PointerInput::Press(const QMouseEvent& event) {
     target_->MouseDownInput(ButtonsOf(event.button()), ShiftOf(event.modifiers()), x, y);
 }
 
-void PointerInput::Move(const QMouseEvent& event) {
-    if (!target_) return;
+bool PointerInput::Move(const QMouseEvent& event) {
+    if (!target_) return false;
+    const bool lost = (held_ & Qt::LeftButton) && !(event.buttons() & Qt::LeftButton);
     inside_ = widget_.rect().contains(event.position().toPoint());
     const auto [x, y] = PointOf(event);
     // Another window had the release: a box that came meanwhile.
@@ -37,8 +38,9 @@ void PointerInput::Move(const QMouseEvent& event) {
         held_ &= ~Qt::MouseButtons(button);
         target_->MouseUpInput(ButtonsOf(button), ShiftOf(event.modifiers()), x, y);
     }
-    if (!target_) return;
+    if (!target_) return lost;
     target_->MouseMoveInput(ButtonsOf(event.buttons()), ShiftOf(event.modifiers()), x, y);
+    return lost;
 }
 
 void PointerInput::Release(const QMouseEvent& event) {

@@ -15,7 +15,7 @@ std::int16_t ShiftOf(Qt::KeyboardModifiers modifiers);
 /// Reports the mouse over a widget to the child, or the control's own surface, that it shows. A press and its release are MouseDown
 /// and MouseUp, and with the left button over the child Click; the second press of a double click is DblClick alone, and its
 /// release MouseUp alone. A pointer that leaves is reported as a move to the nearest point of the edge, so that one who senses the
-/// leaving by its edge strip always does.
+/// leaving by its edge strip always does. A release that another window had is reported at the next move, and makes no click.
 ///
 /// An input may end the target and its peer: the peer disconnects this object, which lives as long as the widget.
 class PointerInput {
@@ -25,7 +25,8 @@ class PointerInput {
     void Disconnect() { target_ = nullptr; }
 
     void Press(const QMouseEvent& event);
-    void Move(const QMouseEvent& event);
+    /// Whether the left button's release had been lost.
+    bool Move(const QMouseEvent& event);
     void Release(const QMouseEvent& event);
     /// The two halves of it: MouseUp, and whether a click follows; then the click.
     bool ReleaseAlone(const QMouseEvent& event);

@@ -104,6 +104,8 @@ class RowView : public QAbstractItemView {
     // What the user does, after the report of the mouse or the key.
     virtual void PressAt(const QMouseEvent& event) = 0;
     virtual void ReleaseAt(const QMouseEvent&) {}
+    /// What the press began ends without its release, which another window had.
+    virtual void LosePress() {}
     /// The pointer is moved with the left button held; `isFar` by more than a click may.
     virtual void DragTo(bool /*isFar*/) {}
     virtual void DoubleClickAt(const QMouseEvent&) {}

@@ -36,7 +36,7 @@ void RowView::mousePressEvent(QMouseEvent* event) {
 void RowView::mouseMoveEvent(QMouseEvent* event) {
     if (!Settle()) return;
     pointerAt_ = event->position().toPoint();
-    pointer_.Move(Inside(*event));
+    if (pointer_.Move(Inside(*event))) LosePress();
     if (!Settle()) return;
     Hover(pointerAt_);
     const bool isFar = (pointerAt_ - pressedAt_).manhattanLength() >= QApplication::startDragDistance();

@@ -20,11 +20,6 @@ namespace {
 
 constexpr double endless = 1 << 20;
 
-bool IsPenChange(const frame::DrawOp& op) {
-    return std::holds_alternative<draw::DrawWidth>(op) || std::holds_alternative<draw::DrawStyle>(op) ||
-           std::holds_alternative<draw::DrawMode>(op);
-}
-
 int Scaled(int pixels, double scale) { return static_cast<int>(std::ceil(pixels * scale)); }
 
 std::size_t BytesOf(const frame::Picture& picture) {
@@ -126,7 +121,7 @@ void SurfaceCanvas::ShowOn(QWidget* widget, QPoint corner) {
 
 void SurfaceCanvas::Draw(const frame::DrawOp& op, const frame::Pen& pen, const frame::Scale& scale, OLE_COLOR background,
                          OLE_COLOR) {
-    if (IsPenChange(op)) return;  // each operation brings its pen
+    if (frame::IsPenChange(op)) return;  // each operation brings its pen
     if (std::holds_alternative<draw::Cls>(op)) return Wipe(background, behind_);
     if (sizedByWidget_) TakeSize(SizeOfWidget());
     Stroke stroke{op, pen, scale, surface_.ForeColor(), {}};

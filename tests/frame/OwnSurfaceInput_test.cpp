@@ -89,5 +89,15 @@ TEST(OwnSurfaceInput, PointsAreInTheSurfacesScale) {
     EXPECT_EQ(surface.InputPoint(150, 300), (std::pair<float, float>{110, 20}));
 }
 
+TEST(OwnSurfaceInput, ABorderMovesThePointsAndNotTheExtent) {
+    headless::HeadlessHost host;
+    auto& surface = host.Create<Touched>("Touched1", {.width = 900, .height = 600}).Surface();
+    surface.SetBorderStyle(1);
+    EXPECT_EQ(surface.InputPoint(30, 30), (std::pair<float, float>{0, 0}));
+    EXPECT_EQ(surface.InputExtent().width, 900);
+    EXPECT_EQ(surface.InputExtent().height, 600);
+    EXPECT_EQ(surface.InputPoint(900, 600), (std::pair<float, float>{surface.ScaleWidth() + 30, surface.ScaleHeight() + 30}));
+}
+
 }  // namespace
 }  // namespace tessel::frame

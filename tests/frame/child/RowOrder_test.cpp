@@ -151,6 +151,23 @@ TEST(RowOrderTest, AnOrderThatWasFilledTakesAnyChangeAfterwards) {
     }
 }
 
+TEST(RowOrderTest, RowsThatFollowOneAnotherMayBeginAtAnyNumber) {
+    Rows rows(700);
+    std::iota(rows.begin(), rows.end(), RowId{17});
+    RowOrder order = OrderOf(rows);
+    ExpectIs(order, rows);
+    EXPECT_EQ(order.Remove(699), 716u);
+    rows.pop_back();
+    ExpectIs(order, rows);
+    EXPECT_EQ(order.Remove(0), 17u);
+    rows.erase(rows.begin());
+    ExpectIs(order, rows);
+    while (!order.Empty()) order.Remove(order.Size() - 1);
+    order.Append(5);
+    order.Append(6);
+    ExpectIs(order, {5, 6});
+}
+
 TEST(RowOrderTest, TheLastRowMayGoAndAnotherComeInItsPlace) {
     RowOrder order = OrderOf(Upto(600));
     EXPECT_EQ(order.Remove(599), 599u);

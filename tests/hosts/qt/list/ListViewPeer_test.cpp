@@ -331,6 +331,27 @@ TEST(ListViewPeer, ARubberBandSelectsWhatItTouches) {
     EXPECT_EQ(screen.Selection(), "row 4, row 5");
 }
 
+TEST(ListViewPeer, ARubberBandEndsWhenAnotherWindowHadTheRelease) {
+    struct Releases {
+        void Hear(std::int16_t button, std::int16_t, float, float) { buttons.push_back(button); }
+        std::vector<int> buttons;
+    } releases;
+    Rows20 screen;
+    screen.list.MouseUp.To<&Releases::Hear>(releases);
+    screen.list.SetFullRowSelect(true);
+    screen.Settle();
+    const QPoint from(screen.port()->width() - 30, screen.CellOf(5).center().y());
+    screen.Drag(from, {20, screen.CellOf(4).center().y()});
+    EXPECT_EQ(screen.Selection(), "row 4, row 5");
+    const QPointF back(20, screen.CellOf(1).center().y());
+    QMouseEvent move(QEvent::MouseMove, back, back, screen.port()->mapToGlobal(back), Qt::NoButton, Qt::NoButton, {});
+    QCoreApplication::sendEvent(screen.port(), &move);
+    EXPECT_EQ(releases.buttons, std::vector<int>{1});
+    EXPECT_EQ(screen.Selection(), "row 4, row 5");
+    screen.Move({20, screen.CellOf(0).center().y()});  // the button goes down elsewhere and comes in
+    EXPECT_EQ(screen.Selection(), "row 4, row 5");
+}
+
 TEST(ListViewPeer, ARubberBandWithCtrlKeepsWhatWasSelected) {
     Rows20 screen;
     screen.list.SetFullRowSelect(true);
